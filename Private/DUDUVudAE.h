@@ -9,11 +9,6 @@
 
 class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
  public:
-  typedef ae::stagecraft::StageWindow StageWindow;
-  typedef ae::stagecraft::ASObject ASObject;
-  typedef ae::stagecraft::ASValue ASValue;
-  typedef ae::stagecraft::ASValueArray ASValueArray;
-
   // The class functions that register the class with the stage.
   static const char* GetClassName();
   static bool FiresEvents();

@@ -309,25 +309,25 @@ void* ScriptEngine::PrototypeOf(int classIndex) const {
   return m_Classes[classIndex]->prototype.m_Ref->object;
 }
 
-const ScriptEngine::Binding* ScriptEngine::Find(void* object) const {
+ScriptEngine::Binding* ScriptEngine::Find(void* object) {
   auto serial = m_Serials.find(object);
   return serial == m_Serials.end() ? nullptr : &m_Bindings.at(serial->second);
 }
 
-ASExtensionClass* ScriptEngine::NativeInstance(void* object) const {
-  const Binding* b = Find(object);
+ASExtensionClass* ScriptEngine::NativeInstance(void* object) {
+  Binding* b = Find(object);
   return b ? b->native : nullptr;
 }
 
 bool ScriptEngine::SetUpdates(void* object, bool on) {
-  const Binding* b = Find(object);
+  Binding* b = Find(object);
   if (!b) return false;
-  const_cast<Binding*>(b)->updates = on;
+  b->updates = on;
   return true;
 }
 
-bool ScriptEngine::IsExtensionObjectOf(void* object, const char* classId) const {
-  const Binding* b = Find(object);
+bool ScriptEngine::IsExtensionObjectOf(void* object, const char* classId) {
+  Binding* b = Find(object);
   return b && m_Classes[b->classIndex]->id == classId;
 }
 

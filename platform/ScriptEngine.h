@@ -78,9 +78,9 @@ class ScriptEngine : public StageWindow {
   // error: records it, leaves nrets undefined values, returns false.
   bool SafeCall(duk_safe_call_function fn, void* udata, duk_idx_t nargs, duk_idx_t nrets);
   // The extension binding of an object (see ASObject).
-  ASExtensionClass* NativeInstance(void* object) const;
+  ASExtensionClass* NativeInstance(void* object);
   bool SetUpdates(void* object, bool on);
-  bool IsExtensionObjectOf(void* object, const char* classId) const;
+  bool IsExtensionObjectOf(void* object, const char* classId);
   void ReleaseSlot(uint32_t slot);
 
   // For the C functions that scripts call.
@@ -108,7 +108,8 @@ class ScriptEngine : public StageWindow {
   };
 
   void CheckThread() const;
-  const Binding* Find(void* object) const;
+  // The binding of an extension object, null for other objects.
+  Binding* Find(void* object);
   // Calls the movie's onEnterFrame; false when it has none.
   bool EnterFrame();
   // Calls OnUpdate on every instance that requests updates; false when none does.

@@ -21,6 +21,12 @@ namespace stagecraft {
 
 class ASExtensionClass {
  public:
+  // The types of the method signature, by their short names also in derived classes.
+  typedef ae::stagecraft::StageWindow StageWindow;
+  typedef ae::stagecraft::ASObject ASObject;
+  typedef ae::stagecraft::ASValue ASValue;
+  typedef ae::stagecraft::ASValueArray ASValueArray;
+
   // The common signature of extension methods.
   typedef void (ASExtensionClass::*MethodFunction)(StageWindow* window, ASObject& object,
                                                    ASValueArray& arguments, ASValue& result);

@@ -13,11 +13,6 @@
 
 class VLPlayerLibAE : public ae::stagecraft::ASExtensionClass {
  public:
-  typedef ae::stagecraft::StageWindow StageWindow;
-  typedef ae::stagecraft::ASObject ASObject;
-  typedef ae::stagecraft::ASValue ASValue;
-  typedef ae::stagecraft::ASValueArray ASValueArray;
-
   // Supplied by the application.
   static const char* GetClassName();
   static bool FiresEvents();
