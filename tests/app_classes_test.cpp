@@ -78,14 +78,12 @@ TEST(ExtensionClasses, IdsAndTablesInOrderAppendedAfterExistingEntries) {
 class ClassesInAMovie : public testing::Test {
  protected:
   ClassesInAMovie() : stage(1), launcher(&stage) {
-    testing::internal::CaptureStdout();
     app = createApplication2();
     app->init(&launcher);
   }
   ~ClassesInAMovie() override {
     stage.Close();
     delete app;
-    testing::internal::GetCapturedStdout();
   }
   std::string Text(const char* global) { return stage.Global().GetProperty(global).AsString().CString(); }
 

@@ -85,6 +85,13 @@ TEST(AEString, SizeCountsTheTerminatingNulAndEmptyIsZero) {
   EXPECT_EQ(AEString("abc"), copy);
   copy.Set(&copy.CString()[1], copy.Length() - 1);  // from its own bytes
   EXPECT_STREQ("bc", copy.CString());
+
+  AEArray<AEString> prefixes(8);
+  prefixes.Append(AEString("second"));
+  prefixes.Insert(0, AEString("first"));
+  prefixes.Remove(1);
+  ASSERT_EQ(1u, prefixes.Size());
+  EXPECT_STREQ("first", prefixes[0].CString());
 }
 
 TEST(AEError, StandardConstants) {
