@@ -43,3 +43,7 @@ IAEKernel* VLPlatformBuiltinKernel() {
   static BuiltinKernel* kernel = new BuiltinKernel;  // never destroyed: used until exit
   return kernel;
 }
+
+IAEKernel* VLPlatformCreateKernel() { return new BuiltinKernel; }
+
+void VLPlatformDestroyKernel(IAEKernel* kernel) { delete static_cast<BuiltinKernel*>(kernel); }

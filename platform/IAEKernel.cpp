@@ -2,9 +2,11 @@
 #include "IAEKernel.h"
 
 #include <dlfcn.h>
+#include <unistd.h>
 
 #include <cstdio>
 #include <mutex>
+#include <string>
 
 IAEKernel* VLPlatformBuiltinKernel();
 
@@ -29,6 +31,22 @@ Loaded& Module() {
   return *loaded;
 }
 
+// The platform keeps its modules next to its own library; there first, else wherever the
+// loader finds the name. (The loader's search relative to this library cannot be relied upon:
+// sanitizers intercept dlopen and so hide who called it.)
+std::string ModulePath() {
+  Dl_info info;
+  if (dladdr(reinterpret_cast<void*>(&IAEKernel::InitializeAEKernel), &info) && info.dli_fname) {
+    std::string self(info.dli_fname);
+    size_t slash = self.rfind('/');
+    if (slash != std::string::npos) {
+      std::string beside = self.substr(0, slash + 1) + kModuleName;
+      if (access(beside.c_str(), F_OK) == 0) return beside;
+    }
+  }
+  return kModuleName;
+}
+
 }  // namespace
 
 IAEKernel* IAEKernel::GetKernel() {
@@ -44,7 +62,7 @@ IAEKernel* IAEKernel::InitializeAEKernel(int argc, char** argv) {
     ++m.users;
     return m.kernel;
   }
-  void* library = dlopen(kModuleName, RTLD_NOW | RTLD_GLOBAL);
+  void* library = dlopen(ModulePath().c_str(), RTLD_NOW | RTLD_GLOBAL);
   if (!library) {
     fprintf(stderr, "Failed to load %s: %s\n", kModuleName, dlerror());
     return nullptr;

@@ -1,0 +1,159 @@
+// The application object from createApplication2 through init, onTerminate and destruction:
+// trace lines, service start and stop order, failure handling, keys and registration.
+#include <gtest/gtest.h>
+
+#include <chrono>
+#include <string>
+#include <vector>
+
+#include "VLStage.h"
+#include "VL_PlatformServices.h"
+#include "VeloraApp.h"
+
+namespace {
+
+const unsigned int kSpFlagKey = 0x01000009;
+const unsigned int kTerminateKey = 0x00400100;
+
+std::string Trace(const char* function, int line) {
+  return "[VL_FLASH]Enter " + std::string(function) + " ,line = " + std::to_string(line) + " \n";
+}
+
+std::vector<VL_PlatformService> ServiceCalls() {
+  VL_PlatformService calls[16];
+  size_t n = VL_PlatformServiceCalls(calls, 16);
+  return std::vector<VL_PlatformService>(calls, calls + std::min<size_t>(n, 16));
+}
+
+class Lifecycle : public testing::Test {
+ protected:
+  Lifecycle() : stage(1), launcher(&stage) {
+    VL_PlatformResetServices();
+    sp_flag = 0;
+  }
+  ~Lifecycle() override {
+    sp_flag = 0;
+    VL_PlatformResetServices();
+  }
+
+  // Runs the whole lifecycle with launcher, returning what it printed.
+  std::string RunLifecycle(scLauncher::ILauncher* with) {
+    testing::internal::CaptureStdout();
+    scLauncher::IApplication2* app = createApplication2();
+    app->init(with);
+    app->onTerminate();
+    delete app;
+    return testing::internal::GetCapturedStdout();
+  }
+
+  // An initialised application that is terminated times times; returns how long the first
+  // onTerminate took, and in *out what the whole lifecycle printed.
+  std::chrono::steady_clock::duration TimedTermination(int times, std::string* out) {
+    testing::internal::CaptureStdout();
+    scLauncher::IApplication2* app = createApplication2();
+    app->init(&launcher);
+    auto start = std::chrono::steady_clock::now();
+    app->onTerminate();
+    auto elapsed = std::chrono::steady_clock::now() - start;
+    for (int i = 1; i < times; ++i) app->onTerminate();
+    delete app;
+    *out = testing::internal::GetCapturedStdout();
+    return elapsed;
+  }
+
+  vlplatform::Stage stage;
+  vlplatform::Launcher launcher;
+};
+
+TEST_F(Lifecycle, StartsTheServicesRegistersTheClassesAndStopsTheServices) {
+  std::string out = RunLifecycle(&launcher);
+  EXPECT_EQ(Trace("createApplication2", 169) + Trace("VeloraApp", 71) + Trace("init", 94) +
+                Trace("init", 99) + "[VL_FLASH] Init network ipc \n" + Trace("onTerminate", 133) +
+                "\n[VL_FLASH] Now send  AEKEY_TERMINATEANIMATION \n" + Trace("~VeloraApp", 78) +
+                "[VL_FLASH] Uninit network ipc \n",
+            out);
+  EXPECT_EQ((std::vector<VL_PlatformService>{VL_SERVICE_DRM_INIT, VL_SERVICE_NET_INIT, VL_SERVICE_NET_UNINIT,
+                                             VL_SERVICE_DRM_TERMINATE}),
+            ServiceCalls());
+  EXPECT_EQ((std::vector<std::string>{"com.ostrel.DUDUVud", "com.ostrel.VLCfgLib", "com.ostrel.VLPlayerLibAE"}),
+            stage.ClassIds());
+}
+
+TEST_F(Lifecycle, WithoutAStageNothingStartsAndNoKeyIsSent) {
+  vlplatform::Launcher stageless(nullptr);
+  std::string out = RunLifecycle(&stageless);
+  EXPECT_EQ(Trace("createApplication2", 169) + Trace("VeloraApp", 71) + Trace("init", 94) +
+                Trace("onTerminate", 133) + Trace("~VeloraApp", 78) + "[VL_FLASH] Uninit network ipc \n",
+            out);
+  // The destructor stops both services whether or not init started them.
+  EXPECT_EQ((std::vector<VL_PlatformService>{VL_SERVICE_NET_UNINIT, VL_SERVICE_DRM_TERMINATE}), ServiceCalls());
+  EXPECT_TRUE(stage.Keys().empty());
+  EXPECT_TRUE(stage.ClassIds().empty());
+}
+
+TEST_F(Lifecycle, OnTerminateSendsTheTerminateKeyWithoutPauseWhenSpFlagIsZero) {
+  std::string out;
+  EXPECT_LT(TimedTermination(2, &out), std::chrono::milliseconds(800));
+  EXPECT_EQ(std::string::npos, out.find("In Sleep FUNCTION"));
+  ASSERT_EQ(4u, stage.Keys().size());  // onTerminate may be called again: it sends the keys again
+  for (size_t i = 0; i < 4; ++i) {
+    EXPECT_EQ(kTerminateKey, stage.Keys()[i].keyCode);
+    EXPECT_EQ(i % 2 == 0, stage.Keys()[i].pressed);
+    EXPECT_EQ(0u, stage.Keys()[i].modifiers);
+  }
+}
+
+TEST_F(Lifecycle, OnTerminateWithSpFlagSendsItsKeyAndPausesFirst) {
+  sp_flag = 1;
+  std::string out;
+  EXPECT_GE(TimedTermination(1, &out), std::chrono::milliseconds(800));
+  EXPECT_NE(std::string::npos,
+            out.find("\n[VL_FLASH] Now send  AEKEY_TERMINATEANIMATION \nIn Sleep FUNCTION, delay time is :800 ms\n"));
+  ASSERT_EQ(4u, stage.Keys().size());
+  const unsigned int codes[] = {kSpFlagKey, kSpFlagKey, kTerminateKey, kTerminateKey};
+  for (size_t i = 0; i < 4; ++i) {
+    EXPECT_EQ(codes[i], stage.Keys()[i].keyCode) << i;
+    EXPECT_EQ(i % 2 == 0, stage.Keys()[i].pressed) << i;
+  }
+}
+
+TEST_F(Lifecycle, AFailingDrmStartIsReportedAndRegistrationGoesOn) {
+  VL_PlatformSetServiceResult(VL_SERVICE_DRM_INIT, 5);
+  std::string out = RunLifecycle(&launcher);
+  EXPECT_NE(std::string::npos,
+            out.find(Trace("init", 99) + "\n[VL_FLASH] Ipriv_drm_Init fail.ret = 5 \n[VL_FLASH] Init network ipc \n"));
+  EXPECT_EQ(3u, stage.ClassIds().size());
+}
+
+TEST_F(Lifecycle, AFailingNetworkQueueLeavesEveryClassUnregistered) {
+  VL_PlatformSetServiceResult(VL_SERVICE_NET_INIT, 1);
+  std::string out = RunLifecycle(&launcher);
+  EXPECT_NE(std::string::npos,
+            out.find("[VL_FLASH] Init network ipc \n[VL_FLASH] init_network_msg_queue Error \n" +
+                     Trace("onTerminate", 133)));
+  EXPECT_TRUE(stage.ClassIds().empty());
+  EXPECT_EQ(2u, stage.Keys().size());
+  EXPECT_FALSE(stage.Evaluate("movie.js", "newExtension('com.ostrel.VLPlayerLibAE');"));
+}
+
+TEST_F(Lifecycle, AFailingDrmStopIsReportedAndDestructionCompletes) {
+  VL_PlatformSetServiceResult(VL_SERVICE_DRM_TERMINATE, -2);
+  std::string out = RunLifecycle(&launcher);
+  EXPECT_NE(std::string::npos, out.find("[VL_FLASH] Uninit network ipc \n\n[VL_FLASH] Ipriv_drm_Terminate fail.ret = -2 \n"));
+}
+
+TEST_F(Lifecycle, KeyFilterLetsEveryKeyThroughAndEventsAreIgnored) {
+  testing::internal::CaptureStdout();
+  scLauncher::IApplication2* app = createApplication2();
+  EXPECT_TRUE(app->filterKeyEvent(0, false));
+  EXPECT_TRUE(app->filterKeyEvent(kTerminateKey, true));
+  EXPECT_TRUE(app->filterKeyEvent(0xFFFFFFFFu, true));
+  app->onEvent(ADDON_HOST_EVENT_SUSPEND);
+  delete app;
+  std::string out = testing::internal::GetCapturedStdout();
+  EXPECT_NE(std::string::npos,
+            out.find(Trace("filterKeyEvent", 159) + Trace("filterKeyEvent", 159) + Trace("filterKeyEvent", 159) +
+                     Trace("onEvent", 154)));
+}
+
+}  // namespace

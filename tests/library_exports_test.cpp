@@ -1,0 +1,39 @@
+// The built library as the launcher sees it: the plain entry symbols, nothing internal.
+#include <dlfcn.h>
+#include <gtest/gtest.h>
+
+#include <cstdio>
+#include <set>
+#include <string>
+
+namespace {
+
+const std::string kLibrary = std::string(VL_BINARY_DIR) + "/libDUDUVud.so";
+
+TEST(LibraryExports, OnlyThePublicInterfaceUnmangled) {
+  FILE* nm = popen(("nm -D --defined-only --format=posix " + kLibrary).c_str(), "r");
+  ASSERT_NE(nullptr, nm);
+  std::set<std::string> symbols;
+  char line[1024];
+  while (fgets(line, sizeof line, nm)) symbols.insert(std::string(line).substr(0, std::string(line).find(' ')));
+  ASSERT_EQ(0, pclose(nm));
+  EXPECT_EQ(1u, symbols.count("createApplication2"));
+  EXPECT_EQ(1u, symbols.count("sp_flag"));
+  for (const std::string& s : symbols) {
+    bool isPublic = s == "createApplication2" || s == "sp_flag" || s == "namespaces" || s.rfind("VL_WS_", 0) == 0;
+    EXPECT_TRUE(isPublic) << "exported: " << s;
+  }
+}
+
+TEST(LibraryExports, TheLoaderFindsTheEntryPointAndTheFlag) {
+  void* library = dlopen(kLibrary.c_str(), RTLD_NOW | RTLD_LOCAL);
+  ASSERT_NE(nullptr, library) << dlerror();
+  EXPECT_NE(nullptr, dlsym(library, "createApplication2"));
+  unsigned char* flag = static_cast<unsigned char*>(dlsym(library, "sp_flag"));
+  ASSERT_NE(nullptr, flag);
+  EXPECT_EQ(0, *flag);
+  EXPECT_EQ(nullptr, dlsym(library, "_ZN9veloraApp9VeloraAppC1Ev"));
+  dlclose(library);
+}
+
+}  // namespace
