@@ -1,0 +1,180 @@
+// VLString: allocation sizes, embedded 0 bytes, bounds of find/substr, trim, comparisons, and the
+// assertion texts of its preconditions.
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "VLString.h"
+
+namespace {
+
+std::string Bytes(const VLString& s) { return std::string(s.c_str(), s.length()); }
+
+TEST(VLString, AllocationFollowsMultiplesOfEight) {
+  VLString s;
+  EXPECT_EQ(0u, s.length());
+  EXPECT_EQ(7u, s.capacity());
+  EXPECT_STREQ("", s.c_str());
+
+  const char* oldBuffer = s.c_str();
+  s.assign("1234567", 7);
+  EXPECT_EQ(7u, s.capacity());
+  EXPECT_EQ(oldBuffer, s.c_str());
+  s.assign("12345678", 8);
+  EXPECT_EQ(15u, s.capacity());  // 7 + 7/2 = 10 -> 16 bytes
+
+  std::string hundred(100, 'x');
+  s.assign(hundred.data(), 100);  // 15/2 = 7 is not above 100/3 = 33: exactly 100 -> 104 bytes
+  EXPECT_EQ(103u, s.capacity());
+  EXPECT_EQ(hundred, Bytes(s));
+
+  std::string big(195, 'y');
+  VLString wide(big.c_str());
+  EXPECT_EQ(199u, wide.capacity());  // 195 -> 200 bytes
+  const char* wideBuffer = wide.c_str();
+  wide.assign(hundred.data(), 100);
+  EXPECT_EQ(wideBuffer, wide.c_str());
+  EXPECT_EQ(199u, wide.capacity());
+
+  VLString grownByHalf(std::string(40, 'z').c_str());  // capacity 47
+  grownByHalf.assign(std::string(60, 'q').c_str(), 60);  // 23 > 20: 47 + 23 = 70 -> 72 bytes
+  EXPECT_EQ(71u, grownByHalf.capacity());
+
+  VLString copy(wide);  // sized to the source's length, not its capacity
+  EXPECT_EQ(103u, copy.capacity());
+  EXPECT_EQ(Bytes(wide), Bytes(copy));
+}
+
+TEST(VLString, AppendReallocatesToTheExactFit) {
+  VLString s("abcde");
+  EXPECT_EQ(7u, s.capacity());
+  s.append("fg", 2);
+  EXPECT_EQ(7u, s.capacity());
+  s.append("h", 1);
+  EXPECT_EQ(15u, s.capacity());
+  s.append("ijklmnopq", 9);  // 17 -> 24 bytes, no growth factor
+  EXPECT_EQ(23u, s.capacity());
+  EXPECT_EQ("abcdefghijklmnopq", Bytes(s));
+  const char* before = s.c_str();
+  s.append(nullptr, 0);
+  EXPECT_EQ(before, s.c_str());
+  EXPECT_EQ(17u, s.length());
+
+  s += '!';
+  s += "?";
+  s += VLString("x\0y", 3);
+  EXPECT_EQ(std::string("abcdefghijklmnopq!?x\0y", 22), Bytes(s));
+}
+
+TEST(VLString, SourcesInsideTheStringItself) {
+  VLString s("abcdef");
+  s.append(s.c_str(), s.length());  // reallocates while reading from the old buffer
+  EXPECT_EQ("abcdefabcdef", Bytes(s));
+  s += s;
+  EXPECT_EQ("abcdefabcdefabcdefabcdef", Bytes(s));
+  s.assign(s.c_str() + 3, 5);  // overlapping copy in place
+  EXPECT_EQ("defab", Bytes(s));
+  s = s;
+  EXPECT_EQ("defab", Bytes(s));
+}
+
+TEST(VLString, EmbeddedZeroBytes) {
+  const char first[] = {'a', 'b', '\0', 'c', 'd'};
+  const char second[] = {'a', 'b', '\0', 'c', 'e'};
+  VLString a(first, 5), b(second, 5);
+  EXPECT_EQ(5u, a.length());
+  EXPECT_EQ('\0', a.c_str()[5]);
+  EXPECT_FALSE(a == b);
+  EXPECT_TRUE(a != b);
+  EXPECT_TRUE(a == "ab");
+  EXPECT_TRUE("ab" == b);
+  EXPECT_FALSE(a != "ab");
+  EXPECT_EQ(2u, a.find('\0'));
+  EXPECT_EQ(std::string("\0cd", 3), Bytes(a.substr(2, 10)));
+  VLString copy(a);
+  EXPECT_TRUE(copy == a);
+  VLString assigned;
+  assigned = a;
+  EXPECT_EQ(Bytes(a), Bytes(assigned));
+}
+
+TEST(VLString, FindAndSubstrBounds) {
+  VLString s("hello");
+  EXPECT_EQ(2u, s.find('l'));
+  EXPECT_EQ(3u, s.find('l', 3));
+  EXPECT_EQ(VLString::npos, s.find('l', 4));
+  EXPECT_EQ(VLString::npos, s.find('x', 10));
+  EXPECT_EQ(VLString::npos, s.find('h', 5));
+  EXPECT_EQ(VLString::npos, VLString().find('\0'));
+  EXPECT_EQ(4294967295u, VLString::npos);
+
+  EXPECT_TRUE(s.substr(5, 3).empty());
+  EXPECT_TRUE(s.substr(100).empty());
+  EXPECT_EQ("lo", Bytes(s.substr(3, 100)));
+  EXPECT_EQ("ell", Bytes(s.substr(1, 3)));
+  EXPECT_EQ("hello", Bytes(s.substr(0)));
+  EXPECT_TRUE(s.substr(2, 0).empty());
+}
+
+TEST(VLString, TrimRemovesOnlySpaces) {
+  VLString s("  a b  ");
+  s.trim();
+  EXPECT_EQ("a b", Bytes(s));
+  VLString tab("\ta ");
+  tab.trim();
+  EXPECT_EQ("\ta", Bytes(tab));
+  VLString blanks("   ");
+  blanks.trim();
+  EXPECT_TRUE(blanks.empty());
+  VLString none;
+  none.trim();
+  EXPECT_TRUE(none.empty());
+  VLString lineEnd(" x\r\n");
+  lineEnd.trim();
+  EXPECT_EQ("x\r\n", Bytes(lineEnd));
+  VLString inner(" a\0b ", 5);  // trim ends the text at the inner 0 byte
+  inner.trim();
+  EXPECT_EQ("a", Bytes(inner));
+}
+
+TEST(VLString, OrderingAndConcatenation) {
+  VLString a("apple"), b("banana");
+  EXPECT_TRUE(a < b);
+  EXPECT_TRUE(b > a);
+  EXPECT_TRUE(a <= b);
+  EXPECT_TRUE(a <= VLString("apple"));
+  EXPECT_TRUE(b >= a);
+  EXPECT_FALSE(a > b);
+  EXPECT_FALSE(a >= b);
+  EXPECT_EQ("applebanana", Bytes(a + b));
+  EXPECT_EQ("apple pie", Bytes(a + " pie"));
+  EXPECT_EQ("green apple", Bytes("green " + a));
+
+  a.swap(b);
+  EXPECT_EQ("banana", Bytes(a));
+  EXPECT_EQ("apple", Bytes(b));
+  a = "kiwi";
+  EXPECT_EQ("kiwi", Bytes(a));
+  a[0] = 'K';
+  const VLString& constA = a;
+  EXPECT_EQ('K', constA[0]);
+}
+
+TEST(VLStringDeathTest, PreconditionsReportTheirCondition) {
+  GTEST_FLAG_SET(death_test_style, "threadsafe");
+  const char* null = nullptr;
+  VLString s("abc");
+  EXPECT_DEATH(VLString{null}, "str != 0");
+  EXPECT_DEATH(VLString(null, 3), "buf != 0");
+  EXPECT_DEATH(s[3], "idx < length\\(\\)");
+  EXPECT_DEATH(static_cast<const VLString&>(s)[7], "idx < length\\(\\)");
+  EXPECT_DEATH(s.assign(null, 2), "buf != 0");
+  EXPECT_DEATH(s.append(null, 2), "buf != 0");
+  EXPECT_DEATH(s = null, "buf != 0");
+  EXPECT_DEATH((void)(s == null), "b != 0");
+  EXPECT_DEATH((void)(null != s), "b != 0");
+  EXPECT_DEATH(s + null, "b != 0");
+  EXPECT_DEATH(null + s, "a != 0");
+}
+
+}  // namespace

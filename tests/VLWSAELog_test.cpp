@@ -1,0 +1,155 @@
+// Logging: lazy area registration, entry and exit trace, bounded formatting, and InitWSLogs with
+// its area masks, targets and return codes.
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "VLTestDir.h"
+#include "VLWSAELog.h"
+#include "VL_Log.h"
+
+namespace {
+
+// Captures every message that reaches a log target while it lives.
+class CapturedLog {
+ public:
+  CapturedLog() { VL_LogSetObserver(Observe, this); }
+  ~CapturedLog() { VL_LogSetObserver(nullptr, nullptr); }
+  std::vector<std::string> lines;
+
+ private:
+  static void Observe(void* ctx, const char* area, int level, const char* text, size_t len) {
+    static_cast<CapturedLog*>(ctx)->lines.push_back(std::string(area) + ":" + std::to_string(level) +
+                                                    ":" + std::string(text, len));
+  }
+};
+
+// Back to the console with every area off, whatever a test did.
+class VLWSAELogTest : public testing::Test {
+ protected:
+  void TearDown() override { VLWSAELog::InitWSLogs(0, 1, ""); }
+};
+
+std::vector<int> ActiveAreas() {
+  std::vector<int> active;
+  for (const VLWSAELog::AreaInfo& area : VLWSAELog::m_areainfos) active.push_back(VL_LogIsAreaActive(area.id));
+  return active;
+}
+
+TEST_F(VLWSAELogTest, AreaTableNamesAndBits) {
+  const char* names[] = {"VL_WSAE", "VL_WSCFGAE", "soap_proxy", "soap_recv", "soap_sent", "soap_test"};
+  unsigned bits[] = {0x100, 0x200, 0x400, 0x800, 0x1000, 0x2000};
+  for (int i = 0; i < VLWSAELog::kAreaCount; ++i) {
+    EXPECT_STREQ(names[i], VLWSAELog::m_areainfos[i].name);
+    EXPECT_EQ(bits[i], VLWSAELog::m_areainfos[i].bit);
+  }
+  EXPECT_STREQ("VL_WSAE", VLWSAELOG_AREA_NAME);
+  EXPECT_STREQ("VL_WSCFGAE", VLWSAE_CFGLOG_AREA_NAME);
+  EXPECT_STREQ("soap_proxy", VLWS_SoapProxyLOG_AREA_NAME);
+  EXPECT_STREQ("soap_recv", VLWS_SoapRecvLOG_AREA_NAME);
+  EXPECT_STREQ("soap_sent", VLWS_SoapSentLOG_AREA_NAME);
+  EXPECT_STREQ("soap_test", VLWS_SoapTestLOG_AREA_NAME);
+}
+
+TEST_F(VLWSAELogTest, MaskActivatesExactlyItsAreas) {
+  EXPECT_EQ(0, VLWSAELog::InitWSLogs(256, 1, ""));
+  EXPECT_EQ(std::vector<int>({1, 0, 0, 0, 0, 0}), ActiveAreas());
+  EXPECT_EQ(0, VLWSAELog::InitWSLogs(16128, 1, ""));
+  EXPECT_EQ(std::vector<int>({1, 1, 1, 1, 1, 1}), ActiveAreas());
+  EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x800 | 0x2000 | 0x1, 1, ""));
+  EXPECT_EQ(std::vector<int>({0, 0, 0, 1, 0, 1}), ActiveAreas());
+  EXPECT_EQ(0, VLWSAELog::InitWSLogs(0, 1, ""));
+  EXPECT_EQ(std::vector<int>({0, 0, 0, 0, 0, 0}), ActiveAreas());
+}
+
+TEST_F(VLWSAELogTest, FileTargetInTheGivenDirectory) {
+  VLTestDir dir;
+  EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x100, 2, dir.path().c_str()));
+  VL_LogOutput(VLWSAELog::m_areainfos[0].id, 1, "into the file");
+  EXPECT_EQ("[VL_WSAE:1] into the file\n", VLReadFile(dir / "log.txt"));
+
+  // Target 0 selects nothing: result 1, the file stays the target, the areas still change.
+  EXPECT_EQ(1, VLWSAELog::InitWSLogs(0x200, 0, ""));
+  EXPECT_EQ(std::vector<int>({0, 1, 0, 0, 0, 0}), ActiveAreas());
+  VL_LogOutput(VLWSAELog::m_areainfos[1].id, 4, "still the file");
+  EXPECT_EQ("[VL_WSAE:1] into the file\n[VL_WSCFGAE:4] still the file\n", VLReadFile(dir / "log.txt"));
+
+  // Bit 0 wins over bit 1: the console.
+  EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x200, 3, dir.path().c_str()));
+  VL_LogOutput(VLWSAELog::m_areainfos[1].id, 4, "to the console");
+  EXPECT_EQ("[VL_WSAE:1] into the file\n[VL_WSCFGAE:4] still the file\n", VLReadFile(dir / "log.txt"));
+}
+
+TEST_F(VLWSAELogTest, EmptyDirectoryMeansTheCurrentOne) {
+  VLTestDir dir;
+  {
+    VLScopedCurrentDir inside(dir.path());
+    EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x400, 2, ""));
+    VL_LogOutput(VLWSAELog::m_areainfos[2].id, 8, "here");
+    EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x400, 2, nullptr));
+    VL_LogOutput(VLWSAELog::m_areainfos[2].id, 8, "again");
+  }
+  EXPECT_EQ("[soap_proxy:8] here\n[soap_proxy:8] again\n", VLReadFile(dir / "log.txt"));
+}
+
+TEST_F(VLWSAELogTest, UnopenableLogFileReturnsTwo) {
+  VLTestDir dir;
+  EXPECT_EQ(2, VLWSAELog::InitWSLogs(0x100, 2, (dir.path() + "missing/").c_str()));
+}
+
+TEST_F(VLWSAELogTest, ScopeTraceAndLazyArea) {
+  static VLLogArea s_Log(VLWSAELOG_AREA_NAME);
+  int id = s_Log.Id();
+  int registered = -1;
+  ASSERT_EQ(0, VL_LogRegisterArea("VL_WSAE", &registered));
+  EXPECT_EQ(registered, id);
+  EXPECT_EQ(id, s_Log.Id());
+
+  VLWSAELog::InitWSLogs(0x100, 1, "");
+  CapturedLog log;
+  {
+    VLWSAELog trace("DUDUVudAE", "getTitles", s_Log.Id());
+    VLLogOutputwithConfig({s_Log.Id(), 8}, "genre %d", 12);
+  }
+  EXPECT_EQ(std::vector<std::string>({"VL_WSAE:4:Entering DUDUVudAE::getTitles",
+                                      "VL_WSAE:8:genre 12", "VL_WSAE:4:Exiting DUDUVudAE::getTitles"}),
+            log.lines);
+}
+
+TEST_F(VLWSAELogTest, AreaThatCannotRegisterStaysUnusable) {
+  VLLogArea broken(nullptr);
+  EXPECT_EQ(-1, broken.Id());
+  EXPECT_EQ(-1, broken.Id());
+}
+
+TEST_F(VLWSAELogTest, FormattedMessageIsCutAndNotFormattedAgain) {
+  VLWSAELog::InitWSLogs(0x100, 1, "");
+  int id = VLWSAELog::m_areainfos[0].id;
+  CapturedLog log;
+  VLLogOutputwithConfig({id, 4}, "url %s", "a%20b%s%n");
+  std::string longText(600, 'x');
+  VLLogOutputwithConfig({id, 1}, "%s", longText.c_str());
+  VLLogOutputwithConfig({VLWSAELog::m_areainfos[1].id, 1}, "inactive area");
+  ASSERT_EQ(2u, log.lines.size());
+  EXPECT_EQ("VL_WSAE:4:url a%20b%s%n", log.lines[0]);
+  EXPECT_EQ("VL_WSAE:1:" + std::string(511, 'x'), log.lines[1]);
+}
+
+TEST_F(VLWSAELogTest, SoapAreasRegisterOnce) {
+  EXPECT_EQ(-1, RECV_VLLogAreaID);
+  soap_init_vl_log();
+  int recv = -1, sent = -1, test = -1;
+  VL_LogRegisterArea("soap_recv", &recv);
+  VL_LogRegisterArea("soap_sent", &sent);
+  VL_LogRegisterArea("soap_test", &test);
+  EXPECT_EQ(recv, RECV_VLLogAreaID);
+  EXPECT_EQ(sent, SENT_VLLogAreaID);
+  EXPECT_EQ(test, TEST_VLLogAreaID);
+  RECV_VLLogAreaID = -7;
+  soap_init_vl_log();
+  EXPECT_EQ(-7, RECV_VLLogAreaID);
+  RECV_VLLogAreaID = recv;
+}
+
+}  // namespace

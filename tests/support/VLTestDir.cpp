@@ -1,0 +1,55 @@
+#include "VLTestDir.h"
+
+#include <ftw.h>
+#include <gtest/gtest.h>
+#include <limits.h>
+#include <stdlib.h>
+#include <unistd.h>
+
+#include <fstream>
+#include <sstream>
+
+namespace {
+
+int RemoveEntry(const char* path, const struct stat*, int, struct FTW*) { return remove(path); }
+
+}  // namespace
+
+VLTestDir::VLTestDir() {
+  std::string base = testing::TempDir();
+  if (base.empty() || base.back() != '/') base += '/';
+  std::string pattern = base + "vltest_XXXXXX";
+  if (!mkdtemp(&pattern[0])) {
+    ADD_FAILURE() << "cannot create a temporary directory below " << base;
+    return;
+  }
+  m_Path = pattern + "/";
+}
+
+VLTestDir::~VLTestDir() {
+  if (!m_Path.empty()) nftw(m_Path.c_str(), RemoveEntry, 16, FTW_DEPTH | FTW_PHYS);
+}
+
+VLScopedCurrentDir::VLScopedCurrentDir(const std::string& dir) {
+  char previous[PATH_MAX];
+  if (getcwd(previous, sizeof previous)) m_Previous = previous;
+  if (chdir(dir.c_str()) != 0) ADD_FAILURE() << "cannot enter " << dir;
+}
+
+VLScopedCurrentDir::~VLScopedCurrentDir() {
+  if (!m_Previous.empty() && chdir(m_Previous.c_str()) != 0) ADD_FAILURE() << "cannot return to " << m_Previous;
+}
+
+std::string VLReadFile(const std::string& path) {
+  std::ifstream in(path, std::ios::binary);
+  std::stringstream content;
+  content << in.rdbuf();
+  return content.str();
+}
+
+bool VLWriteFile(const std::string& path, const std::string& content) {
+  std::ofstream out(path, std::ios::binary | std::ios::trunc);
+  out << content;
+  out.close();
+  return static_cast<bool>(out);
+}

@@ -1,0 +1,42 @@
+// Test helpers for files: a fresh temporary directory per test, and a scoped change of the
+// current directory.
+#ifndef VLTESTDIR_H
+#define VLTESTDIR_H
+
+#include <string>
+
+// A new empty directory below testing::TempDir(), removed with everything in it at the end of
+// the scope. path() ends in "/".
+class VLTestDir {
+ public:
+  VLTestDir();
+  ~VLTestDir();
+  VLTestDir(const VLTestDir&) = delete;
+  VLTestDir& operator=(const VLTestDir&) = delete;
+
+  const std::string& path() const { return m_Path; }
+  // path() + name
+  std::string operator/(const std::string& name) const { return m_Path + name; }
+
+ private:
+  std::string m_Path;
+};
+
+// Makes dir the current directory for the scope, then returns to the previous one.
+class VLScopedCurrentDir {
+ public:
+  explicit VLScopedCurrentDir(const std::string& dir);
+  ~VLScopedCurrentDir();
+  VLScopedCurrentDir(const VLScopedCurrentDir&) = delete;
+  VLScopedCurrentDir& operator=(const VLScopedCurrentDir&) = delete;
+
+ private:
+  std::string m_Previous;
+};
+
+// Whole content of a file ("" when it cannot be read).
+std::string VLReadFile(const std::string& path);
+// Writes content to path (created or truncated); false on failure.
+bool VLWriteFile(const std::string& path, const std::string& content);
+
+#endif  // VLTESTDIR_H
