@@ -1,0 +1,54 @@
+// VLUtilities: static helpers shared by the client, the cache and the configuration code. The
+// functions are grouped by topic; each group is defined in its own source file, named below.
+#ifndef VLUTILITIES_H
+#define VLUTILITIES_H
+
+#include <stddef.h>
+#include <time.h>
+
+#include "VLString.h"
+#include "VL_WS_Types.h"
+
+class VLUtilities {
+ public:
+  // ---- Basic utilities (VLUtilities.cpp) ------------------------------------------------------
+
+  // A copy of s in a new array (release it with delete[]); null or empty s gives a new empty text.
+  static char* StrDup(const char* s);
+  // True when s is "true" in any letter case; false for any other text and for null.
+  static bool Str2Bool(const char* s);
+  // The store's number of a sort order: 0 to 3; any other value gives 0.
+  static int SortOrder2Int(VL_WS_SortOrder order);
+  // Percent-encodes every byte except A-Z, a-z, 0-9 and "-_.!~*'()" as "%XX" (upper-case hex).
+  // Null or empty s gives the empty string.
+  static VLString URLEncode(const char* s);
+  // vsnprintf into buf (always terminated, truncated to bufsize - 1 bytes); returns buf.
+  static char* safe_snprintf(char* buf, size_t bufsize, const char* format, ...)
+#ifdef __GNUC__
+      __attribute__((format(printf, 3, 4)))
+#endif
+      ;
+  // "YYYY/MM/DD hh:mm:ss"
+  static VLString TM2Str(const tm& t);
+  // Wall-clock milliseconds, wrapping modulo 2^32: for measuring intervals.
+  static unsigned int MillisecondTime();
+  // 32-bit FNV-1 style hash of len bytes starting from seed (every caller passes 0). The cache
+  // file name and the check digits of encrypted settings depend on these values: never change.
+  static unsigned int Hash(unsigned int seed, const char* data, unsigned int len);
+  // n bytes from the OpenSSL generator (seeded first when OpenSSL reports it unseeded).
+  // Returns OpenSSL's result: 1 on success.
+  static int RandomBytes(char* buf, unsigned int n);
+  // "XX-XX-XX-XX-XX-XX": the hardware address of the first network interface whose address is
+  // not all zero, or random bytes when there is none.
+  static VLString GetUniqueIdentifier();
+
+  // ---- Status conversion (VLUtilities_Status.cpp) ---------------------------------------------
+
+  // ---- Record conversion (VLUtilities_Convert.cpp) --------------------------------------------
+
+  // ---- Box art and images (VLUtilities_BoxArt.cpp) --------------------------------------------
+
+  // ---- Endpoint query (VLUtilities_Endpoint.cpp) ----------------------------------------------
+};
+
+#endif  // VLUTILITIES_H
