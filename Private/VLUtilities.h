@@ -44,6 +44,16 @@ class VLUtilities {
 
   // ---- Status conversion (VLUtilities_Status.cpp) ---------------------------------------------
 
+  // The status of a SOAP runtime error: 0 for none, -2012 end of input, -2011 TCP, -5030 TLS,
+  // -4000 - n for HTTP failures (an HTTP status n included), -6000 - n for SOAP protocol
+  // failures, -1004 for anything else.
+  static VL_WS_Status To_VL_WS_Status(int soapError);
+  // The status of a call: a SOAP error wins; else response code 0 is success; else the code's
+  // status for operations that map their codes ("VL_WS_authorizeDevice",
+  // "VL_WS_doPurchaseSavedBilling", "VL_WS_getBillingInfo", "VL_WS_assignGiftCertificateToUser",
+  // "VL_WS_calcOrderTax"); any other code, and any code with a null or empty operation, -1004.
+  static VL_WS_Status To_VL_WS_Status(int soapError, int responseCode, const char* operation);
+
   // ---- Record conversion (VLUtilities_Convert.cpp) --------------------------------------------
 
   // ---- Box art and images (VLUtilities_BoxArt.cpp) --------------------------------------------
