@@ -58,6 +58,15 @@ class VLUtilities {
 
   // ---- Box art and images (VLUtilities_BoxArt.cpp) --------------------------------------------
 
+  // The size word of an image size in the URL's folder ("135s" for VL_WS_BOXART_135S) and in the
+  // image's name ("135"); the empty text for a value that is not a size.
+  static const char* BoxArtSize2FolderSize(VL_WS_BoxArtSize size);
+  static const char* BoxArtSize2ImageSize(VL_WS_BoxArtSize size);
+  // The cache file of an image: the folder of the cache database at path, then the box-art prefix
+  // as it is (not URL-encoded), the image word and ".jpg". Asserts that both texts are given.
+  static VLString GetBoxArtImageFileName(const char* path, const char* boxartprefix,
+                                         VL_WS_BoxArtSize size);
+
   // ---- Endpoint query (VLUtilities_Endpoint.cpp) ----------------------------------------------
 };
 
