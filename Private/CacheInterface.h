@@ -8,7 +8,7 @@
 #define CACHEINTERFACE_H
 
 #include "VLString.h"
-#include "VL_WS_CacheParam2.h"
+#include "VL_WS_SetupParams2.h"
 #include "VL_WS_Types.h"
 
 class VLWS_IntVector;
