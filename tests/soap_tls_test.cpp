@@ -97,6 +97,8 @@ TEST(SoapTls, RootBlockWalkStopsAtDamagedEntryAndFailsOnRefusal) {
     std::string block = "one-BEG-" + a + "-END-two-BEG-" + b.substr(0, 40) + "@@@@" + b.substr(44) + "-END-three-BEG-" + c + "-END-";
     EXPECT_EQ(SOAP_OK, VLAddRootCertificates(&s, block.c_str(), X509_STORE_add_cert));
     EXPECT_EQ(before + 1, CountCerts(&s));  // the damaged second entry ended the walk
+    soap_destroy(&s);
+    soap_end(&s);
   }
   {
     soap s;
@@ -108,6 +110,8 @@ TEST(SoapTls, RootBlockWalkStopsAtDamagedEntryAndFailsOnRefusal) {
     EXPECT_STREQ("SSL add chain certificate failed in soap_ssl_client_cacerts()", *soap_faultstring(&s));
     std::string detail = "At position " + std::to_string(block.find(b));
     EXPECT_STREQ(detail.c_str(), *soap_faultdetail(&s));
+    soap_destroy(&s);
+    soap_end(&s);
   }
 }
 

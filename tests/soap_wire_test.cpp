@@ -257,7 +257,7 @@ TEST_F(SoapWire, DispatcherRoutesByAccessTypeWithIdenticalBodies) {
   DownloadAPI dl;
   Bind(&st, &m_Params);
   Bind(&dl, &dlParams);
-  for (VL_WS_AccessType type : {UNKNOWN, STREAM, DOWNLOAD, static_cast<VL_WS_AccessType>(9)}) {
+  for (VL_WS_AccessType type : {UNKNOWN, STREAM, DOWNLOAD, static_cast<VL_WS_AccessType>(3)}) {
     StreamDownloadAPI api;
     api.Init(&st, &dl, type);
     soap& ctx = api;
