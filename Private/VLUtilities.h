@@ -7,7 +7,26 @@
 #include <time.h>
 
 #include "VLString.h"
-#include "VL_WS_Types.h"
+#include "VL_WS_Records.h"
+
+// Schema records of the store's answers (generated from soap/VL.h.in).
+class VL1__ArrayOfGenre;
+class VL1__ArrayOfGetTitlesResponse;
+class VL1__ArrayOfTitleListing;
+class VL1__ArrayOfTitleListingPurchasedForPass;
+class VL1__ArrayOfTitleListingResponse;
+class VL1__AuthorizeDeviceResponse;
+class VL1__GetMyVideosResponse;
+class VL1__GetStreamingAssetLocationResponse;
+class VL1__GetTitlesResponse;
+class VL1__GetWishlistItemsResponse;
+class VL1__RecommendedTitlesResponse;
+class VL1__StandardResponse;
+class VL1__TitleListing;
+class VL1__TitleListingPurchased;
+class VL1__TitleListingResponse;
+class VL1__TranslatedTivoExternalIdResponse;
+class VL1__TvEpisodeList;
 
 class VLUtilities {
  public:
@@ -44,9 +63,74 @@ class VLUtilities {
 
   // ---- Status conversion (VLUtilities_Status.cpp) ---------------------------------------------
 
+  // The status of a SOAP runtime error: 0 for none, -2012 end of input, -2011 TCP, -5030 TLS,
+  // -4000 - n for HTTP failures (an HTTP status n included), -6000 - n for SOAP protocol
+  // failures, -1004 for anything else.
+  static VL_WS_Status To_VL_WS_Status(int soapError);
+  // The status of a call: a SOAP error wins; else response code 0 is success; else the code's
+  // status for operations that map their codes ("VL_WS_authorizeDevice",
+  // "VL_WS_doPurchaseSavedBilling", "VL_WS_getBillingInfo", "VL_WS_assignGiftCertificateToUser",
+  // "VL_WS_calcOrderTax"); any other code, and any code with a null or empty operation, -1004.
+  static VL_WS_Status To_VL_WS_Status(int soapError, int responseCode, const char* operation);
+
   // ---- Record conversion (VLUtilities_Convert.cpp) --------------------------------------------
+  //
+  // Copies of the store's schema records into client records, which own their copies and outlive
+  // the call's SOAP memory. The client record must have been prepared with VLRecordInit (nested
+  // arrays included) and hold nothing yet. Each converter asserts that t is given ("t != 0").
+  // Rules: numbers and enumeration values as they are, schema booleans as 0 or 1; texts through
+  // StrDup (a missing text becomes an owned empty one); arrays only when the schema array is
+  // present and has elements, each element with its own tag cell; a product's ExpireDate
+  // (an XML schema date-time) re-formatted as "YYYY/MM/DD hh:mm:ss", all zeros when missing or
+  // unreadable.
+
+  static void VL1__StandardResponse2VL_WS_StandardResponse(const VL1__StandardResponse* t,
+                                                           VL_WS_StandardResponse& r);
+  static void VL1__TitleListing2VL_WS_TitleListing(const VL1__TitleListing* t,
+                                                   VL_WS_TitleListing& r);
+  static void VL1__ArrayOfTitleListing2VL_WS_TitleListingArray(const VL1__ArrayOfTitleListing* t,
+                                                               VL_WS_TitleListingArray& r);
+  // The detail fields and the title fields; the wishlist flag of the answer is not kept.
+  static void VL1__TitleListingResponse2VL_WS_TitleListingResponse(
+      const VL1__TitleListingResponse* t, VL_WS_TitleListingResponse& r);
+  static void VL1__ArrayOfTitleListingResponse2VL_WS_TitleListingResponseArray(
+      const VL1__ArrayOfTitleListingResponse* t, VL_WS_TitleListingResponseArray& r);
+  static void VL1__GetTitlesResponse2VL_WS_TitlesResponse(const VL1__GetTitlesResponse* t,
+                                                          VL_WS_TitlesResponse& r);
+  static void VL1__ArrayOfGetTitlesResponse2VL_WS_TitlesResponseArray(
+      const VL1__ArrayOfGetTitlesResponse* t, VL_WS_TitlesResponseArray& r);
+  static void VL1__RecommendedTitlesResponse2VL_WS_RecommendedTitlesResponse(
+      const VL1__RecommendedTitlesResponse* t, VL_WS_RecommendedTitlesResponse& r);
+  static void VL1__ArrayOfGenre2VL_WS_GenreArray(const VL1__ArrayOfGenre* t, VL_WS_GenreArray& r);
+  static void VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse(const VL1__TvEpisodeList* t,
+                                                             VL_WS_TvEpisodeListResponse& r);
+  static void VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExternalIDResponse(
+      const VL1__TranslatedTivoExternalIdResponse* t, VL_WS_TranslateTivoExternalIDResponse& r);
+  // The purchase fields and the title fields.
+  static void VL1__TitleListingPurchased2VL_WS_TitleListingPurchased(
+      const VL1__TitleListingPurchased* t, VL_WS_TitleListingPurchased& r);
+  static void VL1__GetMyVideosResponse2VL_WS_MyVideosResponse(const VL1__GetMyVideosResponse* t,
+                                                              VL_WS_MyVideosResponse& r);
+  static void VL1__GetWishlistItemsResponse2VL_WS_WishlistItemsResponse(
+      const VL1__GetWishlistItemsResponse* t, VL_WS_WishlistItemsResponse& r);
+  static void VL1__ArrayOfTitleListingPurchasedForPass2VL_WS_TitleListingPurchasedForPassArray(
+      const VL1__ArrayOfTitleListingPurchasedForPass* t, VL_WS_TitleListingPurchasedForPassArray& r);
+  // IsAdultVerificationEnabled is true when the answer's text is "true" in any letter case.
+  static void VL1__AuthorizeDeviceResponse2VL_WS_AuthorizeDeviceResponse(
+      const VL1__AuthorizeDeviceResponse* t, VL_WS_AuthorizeDeviceResponse& r);
+  static void VL1__GetStreamingAssetLocationResponse2VL_WS_StreamingAssetLocationResponse(
+      const VL1__GetStreamingAssetLocationResponse* t, VL_WS_StreamingAssetLocationResponse& r);
 
   // ---- Box art and images (VLUtilities_BoxArt.cpp) --------------------------------------------
+
+  // The size word of an image size in the URL's folder ("135s" for VL_WS_BOXART_135S) and in the
+  // image's name ("135"); the empty text for a value that is not a size.
+  static const char* BoxArtSize2FolderSize(VL_WS_BoxArtSize size);
+  static const char* BoxArtSize2ImageSize(VL_WS_BoxArtSize size);
+  // The cache file of an image: the folder of the cache database at path, then the box-art prefix
+  // as it is (not URL-encoded), the image word and ".jpg". Asserts that both texts are given.
+  static VLString GetBoxArtImageFileName(const char* path, const char* boxartprefix,
+                                         VL_WS_BoxArtSize size);
 
   // ---- Endpoint query (VLUtilities_Endpoint.cpp) ----------------------------------------------
 };

@@ -1,0 +1,91 @@
+// CacheMgr: the local cache in one SQLite database, in memory (type 1) or in a file (type 2).
+//
+// Tables: Service (service answers by Name and Key), BoxArt (images by Prefix and Dim), Cache
+// (the last catalogue load time) and Userdata (user data and wishlist flags by Name and Key).
+// The total byte budget is split between the three kinds of data; a write that finds its kind
+// over budget first evicts (see LimitHandler).
+//
+// A file database is opened and closed around every operation, so several CacheMgr objects (one
+// per client handle, each used by one thread) can share the file: SQLite's file locks serialise
+// them, with a busy timeout of 10 seconds. A memory database lives from Open to Close and
+// belongs to its one object.
+#ifndef CACHEMGR_H
+#define CACHEMGR_H
+
+#include "CacheInterface.h"
+#include "VLString.h"
+
+struct sqlite3;
+struct sqlite3_stmt;
+
+class CacheMgr : public CacheInterface {
+ public:
+  CacheMgr();
+  ~CacheMgr() override;  // closes the cache
+  CacheMgr(const CacheMgr&) = delete;
+  CacheMgr& operator=(const CacheMgr&) = delete;
+
+  int Open(const VL_WS_CacheParam2& params) override;
+  int Close() override;
+  bool ReadMetaData(const VLString& name, const VLString& key, VLString& value) override;
+  bool WriteMetaData(const VLString& name, const VLString& key, const VLString& value) override;
+  bool UpdateLastCacheLoadTime(const VLString& time) override;
+  bool WriteBoxArt(const VLString& prefix, VL_WS_BoxArtSize dim, unsigned int size,
+                   const VLString& lastModified, unsigned int needUpdate,
+                   const VLString& data) override;
+  bool ReadBoxArt(const VLString& prefix, VL_WS_BoxArtSize dim, unsigned int& size,
+                  VLString& lastModified, unsigned int& needUpdate, VLString& data) override;
+  bool SetBoxArtNeedUpdate() override;
+  bool ReadUserData(const VLString& name, const VLString& key, VLString& value) override;
+  bool WriteUserData(const VLString& name, const VLString& key, const VLString& value) override;
+  bool PurgeUserData(const VLString& name) override;
+  bool ReadWishlistFlag(int titleID, bool& flag) override;
+  bool WriteWishlistFlag(int titleID, bool flag) override;
+  bool WriteWishlistFlags(const VLWS_IntVector& titleIDs, const VLWS_BoolVector& flags) override;
+  bool RemoveWishlistFlag(int titleID) override;
+  bool RemoveAllWishlistFlags() override;
+
+  // Run one statement on the open connection (asserting there is one) and return its SQLite
+  // result code, 0 when it finished or produced a row. result receives the first column of the
+  // first row, as text or as a number truncated to 32 bits; it is emptied (0) first.
+  int ExecuteSQL(const VLString& sql, VLString& result);
+  int ExecuteSQL(const VLString& sql, unsigned int& result);
+
+  // The byte budgets of the three kinds after Open; 0 means no limit.
+  unsigned int MetaDataLimit() const { return m_MetaDataLimit; }
+  unsigned int BoxArtLimit() const { return m_BoxArtLimit; }
+  unsigned int UserDataLimit() const { return m_UserDataLimit; }
+
+ private:
+  class ScopedConnection;
+
+  bool Caches(int kind) const;
+  void SplitBudget();
+  int OpenConnection();
+  int CloseConnection(bool force);
+  int CreateSchema();
+  void LimitHandler(int kind);
+
+  int Prepare(const char* sql);
+  void Finalize();
+  void BindText(int index, const VLString& text);
+  void ColumnText(int index, VLString& text);
+  int Execute(const char* sql, VLString* text, unsigned int* number);
+  bool ReadNamedValue(int kind, const char* sql, const VLString& name, const VLString& key,
+                      VLString& value);
+  bool WriteNamedValue(int kind, const char* sql, const VLString& name, const VLString& key,
+                       const VLString& value);
+
+  int m_CacheType;
+  int m_CacheData;
+  unsigned int m_CacheLimit;
+  VLString m_Path;
+  bool m_Opened;
+  sqlite3* m_DB;
+  sqlite3_stmt* m_Stmt;  // the statement of the operation under way
+  unsigned int m_MetaDataLimit;
+  unsigned int m_BoxArtLimit;
+  unsigned int m_UserDataLimit;
+};
+
+#endif  // CACHEMGR_H

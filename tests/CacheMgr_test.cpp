@@ -1,0 +1,559 @@
+// CacheMgr on a real SQLite file and in memory: budgets and eviction, the three kinds of data,
+// wishlist flags, the catalogue load time, and two objects sharing one file from two threads.
+#include "CacheMgr.h"
+
+#include <gtest/gtest.h>
+#include <sqlite3.h>
+
+#include <string>
+#include <thread>
+
+#include "VLFile.h"
+#include "VLTestDir.h"
+#include "VLWS_BoolVector.h"
+#include "VLWS_IntVector.h"
+
+namespace {
+
+const int kAllData = 7;
+const int kMemory = 1;
+const int kFile = 2;
+
+VL_WS_CacheParam2 Params(int type, int data, int limit, const std::string& path = "") {
+  VL_WS_CacheParam2 params;
+  params.CacheType = type;
+  params.CacheData = data;
+  params.CacheLimit = limit;
+  params.CachePath = path.c_str();
+  return params;
+}
+
+std::string Str(const VLString& s) { return std::string(s.c_str(), s.length()); }
+
+bool HasMeta(CacheMgr& cache, const char* name, const char* key) {
+  VLString value;
+  return cache.ReadMetaData(name, key, value);
+}
+
+bool HasUser(CacheMgr& cache, const char* name, const char* key) {
+  VLString value;
+  return cache.ReadUserData(name, key, value);
+}
+
+// Runs one statement on a cache file from outside, as another program would.
+void RunOnFile(const std::string& path, const std::string& sql) {
+  sqlite3* db = nullptr;
+  ASSERT_EQ(SQLITE_OK, sqlite3_open(path.c_str(), &db));
+  EXPECT_EQ(SQLITE_OK, sqlite3_exec(db, sql.c_str(), nullptr, nullptr, nullptr)) << sql;
+  sqlite3_close(db);
+}
+
+// ---- Budget -------------------------------------------------------------------------------------
+
+TEST(CacheBudget, SplitsFifteenSeventyFifteenAndGivesTheRestToBoxArt) {
+  CacheMgr cache;
+  ASSERT_EQ(0, cache.Open(Params(kMemory, kAllData, 1000)));
+  EXPECT_EQ(150u, cache.MetaDataLimit());
+  EXPECT_EQ(700u, cache.BoxArtLimit());
+  EXPECT_EQ(150u, cache.UserDataLimit());
+
+  ASSERT_EQ(0, cache.Open(Params(kMemory, kAllData, 999)));
+  EXPECT_EQ(149u, cache.MetaDataLimit());
+  EXPECT_EQ(701u, cache.BoxArtLimit());
+  EXPECT_EQ(149u, cache.UserDataLimit());
+
+  ASSERT_EQ(0, cache.Open(Params(kMemory, kAllData, 0)));
+  EXPECT_EQ(0u, cache.MetaDataLimit());
+  EXPECT_EQ(0u, cache.BoxArtLimit());
+  EXPECT_EQ(0u, cache.UserDataLimit());
+}
+
+TEST(CacheBudget, RestGoesToUserDataWithoutBoxArtElseToMetadata) {
+  CacheMgr cache;
+  ASSERT_EQ(0, cache.Open(Params(kMemory, 1 | 4, 1000)));
+  EXPECT_EQ(150u, cache.MetaDataLimit());
+  EXPECT_EQ(0u, cache.BoxArtLimit());
+  EXPECT_EQ(850u, cache.UserDataLimit());
+
+  ASSERT_EQ(0, cache.Open(Params(kMemory, 1, 1000)));
+  EXPECT_EQ(1000u, cache.MetaDataLimit());
+
+  // Budgets above 2^31 bytes are read as unsigned.
+  ASSERT_EQ(0, cache.Open(Params(kMemory, 2, static_cast<int>(3000000000u))));
+  EXPECT_EQ(3000000000u, cache.BoxArtLimit());
+
+  cache.Close();
+  EXPECT_EQ(0u, cache.BoxArtLimit());
+}
+
+// ---- Behaviour shared by memory and file caches ---------------------------------------------------
+
+class CacheKinds : public testing::TestWithParam<int> {
+ protected:
+  int Open(int data, int limit = 0) { return m_Cache.Open(Params(GetParam(), data, limit, m_Dir / "c.vl")); }
+
+  VLTestDir m_Dir;
+  CacheMgr m_Cache;
+};
+
+INSTANTIATE_TEST_SUITE_P(MemoryAndFile, CacheKinds, testing::Values(kMemory, kFile),
+                         [](const testing::TestParamInfo<int>& info) {
+                           return info.param == kMemory ? "Memory" : "File";
+                         });
+
+TEST_P(CacheKinds, MetadataKeepsItsExactBytes) {
+  ASSERT_EQ(0, Open(kAllData));
+  const std::string bytes("\x1f\x8b\0\x01zip\0", 8);
+  VLString value(bytes.data(), bytes.size());
+  EXPECT_TRUE(m_Cache.WriteMetaData("getTitles", "1,1,20,2", value));
+  VLString read("old");
+  EXPECT_TRUE(m_Cache.ReadMetaData("getTitles", "1,1,20,2", read));
+  EXPECT_EQ(bytes, Str(read));
+
+  // Other keys and names are misses, and a miss empties the output.
+  EXPECT_FALSE(m_Cache.ReadMetaData("getTitles", "1,1,10,2", read));
+  EXPECT_EQ("", Str(read));
+  EXPECT_FALSE(HasMeta(m_Cache, "searchForTitle", "1,1,20,2"));
+  // Service and user data are separate.
+  EXPECT_FALSE(HasUser(m_Cache, "getTitles", "1,1,20,2"));
+
+  // The empty key is a key like any other (navigation is cached under it).
+  EXPECT_TRUE(m_Cache.WriteMetaData("getNavigation", "", "nav"));
+  EXPECT_TRUE(HasMeta(m_Cache, "getNavigation", ""));
+}
+
+TEST_P(CacheKinds, EmptyNamesAndValuesAreRefused) {
+  ASSERT_EQ(0, Open(kAllData));
+  EXPECT_FALSE(m_Cache.WriteMetaData("", "k", "v"));
+  EXPECT_FALSE(m_Cache.WriteMetaData("n", "k", ""));
+  EXPECT_FALSE(m_Cache.WriteUserData("", "k", "v"));
+  EXPECT_FALSE(m_Cache.WriteUserData("n", "k", ""));
+  EXPECT_FALSE(HasMeta(m_Cache, "n", "k"));
+  EXPECT_FALSE(HasMeta(m_Cache, "", "k"));
+  EXPECT_FALSE(m_Cache.WriteBoxArt("", VL_WS_BOXART_95, 1, "", 0, ""));
+}
+
+TEST_P(CacheKinds, KindsWhoseBitIsOffAreNotCached) {
+  ASSERT_EQ(0, Open(kAllData));
+  ASSERT_TRUE(m_Cache.WriteMetaData("n", "k", "v"));
+  ASSERT_EQ(0, Open(4));  // user data only; the file keeps its rows
+  VLString value("x");
+  EXPECT_FALSE(m_Cache.ReadMetaData("n", "k", value));
+  EXPECT_EQ("", Str(value));
+  EXPECT_FALSE(m_Cache.WriteMetaData("n", "k", "v"));
+  EXPECT_FALSE(m_Cache.UpdateLastCacheLoadTime("t"));
+  EXPECT_FALSE(m_Cache.WriteBoxArt("p", VL_WS_BOXART_95, 1, "", 0, "d"));
+  EXPECT_FALSE(m_Cache.SetBoxArtNeedUpdate());
+  EXPECT_TRUE(m_Cache.WriteWishlistFlag(1, true));
+
+  ASSERT_EQ(0, Open(1));
+  bool flag = true;
+  EXPECT_FALSE(m_Cache.ReadWishlistFlag(1, flag));
+  EXPECT_FALSE(flag);
+  EXPECT_FALSE(m_Cache.WriteUserData("n", "k", "v"));
+  EXPECT_FALSE(m_Cache.PurgeUserData(""));
+  EXPECT_FALSE(m_Cache.RemoveAllWishlistFlags());
+}
+
+TEST_P(CacheKinds, ClosedCacheAnswersNothing) {
+  ASSERT_EQ(0, Open(kAllData));
+  ASSERT_TRUE(m_Cache.WriteMetaData("n", "k", "v"));
+  EXPECT_EQ(0, m_Cache.Close());
+  EXPECT_FALSE(HasMeta(m_Cache, "n", "k"));
+  EXPECT_FALSE(m_Cache.WriteMetaData("n", "k", "v"));
+  EXPECT_EQ(0, m_Cache.Close());
+}
+
+// With a metadata budget of 150 bytes and 150 bytes stored, a write of 10 more bytes finds 150
+// (not above the budget) and stores; the next write finds 160 and empties Service and Userdata
+// before storing its own row.
+TEST_P(CacheKinds, MetadataEvictionIsStrictAndEmptiesUserDataToo) {
+  ASSERT_EQ(0, Open(kAllData, 1000));
+  ASSERT_EQ(150u, m_Cache.MetaDataLimit());
+  ASSERT_TRUE(m_Cache.WriteUserData("getEmailAddress", "", "mail"));
+  ASSERT_TRUE(m_Cache.WriteMetaData("a", "1", std::string(150, 'a').c_str()));
+  ASSERT_TRUE(m_Cache.WriteMetaData("a", "2", std::string(10, 'b').c_str()));
+  EXPECT_TRUE(HasMeta(m_Cache, "a", "1"));
+  EXPECT_TRUE(HasMeta(m_Cache, "a", "2"));
+  EXPECT_TRUE(HasUser(m_Cache, "getEmailAddress", ""));
+
+  ASSERT_TRUE(m_Cache.WriteMetaData("a", "3", "c"));
+  EXPECT_FALSE(HasMeta(m_Cache, "a", "1"));
+  EXPECT_FALSE(HasMeta(m_Cache, "a", "2"));
+  EXPECT_TRUE(HasMeta(m_Cache, "a", "3"));
+  EXPECT_FALSE(HasUser(m_Cache, "getEmailAddress", ""));
+}
+
+TEST_P(CacheKinds, UserDataEvictionEmptiesServiceToo) {
+  ASSERT_EQ(0, Open(kAllData, 1000));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getTitles", "k", "page"));
+  ASSERT_TRUE(m_Cache.WriteUserData("u", "1", std::string(151, 'u').c_str()));
+  ASSERT_TRUE(m_Cache.WriteWishlistFlag(5, true));  // finds 151 > 150
+  EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
+  EXPECT_FALSE(HasUser(m_Cache, "u", "1"));
+  bool flag = false;
+  EXPECT_TRUE(m_Cache.ReadWishlistFlag(5, flag));
+  EXPECT_TRUE(flag);
+}
+
+TEST_P(CacheKinds, NoBudgetNeverEvicts) {
+  ASSERT_EQ(0, Open(kAllData, 0));
+  for (int i = 0; i < 5; ++i) {
+    ASSERT_TRUE(m_Cache.WriteMetaData("a", std::to_string(i).c_str(), std::string(100000, 'x').c_str()));
+  }
+  EXPECT_TRUE(HasMeta(m_Cache, "a", "0"));
+}
+
+TEST_P(CacheKinds, BoxArtRowsKeepValidatorsAndRevalidationMark) {
+  ASSERT_EQ(0, Open(kAllData));
+  const std::string image("\xff\xd8\xff\0jpeg", 8);
+  ASSERT_TRUE(m_Cache.WriteBoxArt("abc", VL_WS_BOXART_135S, 4321, "Tue, 01 Mar 2011 10:00:00 GMT",
+                                  0, VLString(image.data(), image.size())));
+  unsigned size = 1, needUpdate = 1;
+  VLString lastModified("x"), data("x");
+  ASSERT_TRUE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_135S, size, lastModified, needUpdate, data));
+  EXPECT_EQ(4321u, size);
+  EXPECT_EQ("Tue, 01 Mar 2011 10:00:00 GMT", Str(lastModified));
+  EXPECT_EQ(0u, needUpdate);
+  EXPECT_EQ(image, Str(data));
+
+  EXPECT_TRUE(m_Cache.SetBoxArtNeedUpdate());
+  ASSERT_TRUE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_135S, size, lastModified, needUpdate, data));
+  EXPECT_EQ(1u, needUpdate);
+
+  // Another size of the same title is another row; a miss resets every output.
+  EXPECT_FALSE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_EQ(0u, size);
+  EXPECT_EQ(0u, needUpdate);
+  EXPECT_EQ("", Str(lastModified));
+  EXPECT_EQ("", Str(data));
+
+  // A file cache stores no bytes: its images are files.
+  ASSERT_TRUE(m_Cache.WriteBoxArt("abc", VL_WS_BOXART_95, 10, "", 0, ""));
+  ASSERT_TRUE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_EQ(10u, size);
+  EXPECT_EQ("", Str(data));
+}
+
+TEST_P(CacheKinds, LoadTimeChangeEmptiesServiceOnly) {
+  ASSERT_EQ(0, Open(kAllData));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getTitles", "k", "page"));
+  ASSERT_TRUE(m_Cache.WriteWishlistFlag(1, true));
+  // The first time on a new database is a change.
+  EXPECT_TRUE(m_Cache.UpdateLastCacheLoadTime("2011-03-01T10:00:00"));
+  EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
+
+  ASSERT_TRUE(m_Cache.WriteMetaData("getTitles", "k", "page"));
+  EXPECT_TRUE(m_Cache.UpdateLastCacheLoadTime("2011-03-01T10:00:00"));
+  EXPECT_TRUE(HasMeta(m_Cache, "getTitles", "k"));
+
+  EXPECT_TRUE(m_Cache.UpdateLastCacheLoadTime("2011-03-02T10:00:00"));
+  EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
+  bool flag = false;
+  EXPECT_TRUE(m_Cache.ReadWishlistFlag(1, flag));
+
+  EXPECT_FALSE(m_Cache.UpdateLastCacheLoadTime(""));
+}
+
+TEST_P(CacheKinds, WishlistFlags) {
+  ASSERT_EQ(0, Open(kAllData));
+  bool flag = true;
+  EXPECT_FALSE(m_Cache.ReadWishlistFlag(7, flag));
+  EXPECT_FALSE(flag);
+
+  ASSERT_TRUE(m_Cache.WriteWishlistFlag(7, false));
+  flag = true;
+  EXPECT_TRUE(m_Cache.ReadWishlistFlag(7, flag));
+  EXPECT_FALSE(flag);
+  ASSERT_TRUE(m_Cache.WriteWishlistFlag(-3, true));
+  EXPECT_TRUE(m_Cache.ReadWishlistFlag(-3, flag));
+  EXPECT_TRUE(flag);
+  // A flag is a user-data row under "WishlistFlag" and the title in decimal.
+  VLString value;
+  EXPECT_TRUE(m_Cache.ReadUserData("WishlistFlag", "-3", value));
+  EXPECT_EQ("1", Str(value));
+
+  EXPECT_TRUE(m_Cache.RemoveWishlistFlag(7));
+  EXPECT_FALSE(m_Cache.ReadWishlistFlag(7, flag));
+  EXPECT_TRUE(m_Cache.RemoveWishlistFlag(7));  // no row: still done
+}
+
+TEST_P(CacheKinds, WishlistFlagListsMustMatch) {
+  ASSERT_EQ(0, Open(kAllData));
+  VLWS_IntVector ids;
+  VLWS_BoolVector flags;
+  EXPECT_FALSE(m_Cache.WriteWishlistFlags(ids, flags));
+  ids.push_back(1);
+  ids.push_back(2);
+  ids.push_back(3);
+  flags.push_back(true);
+  flags.push_back(false);
+  EXPECT_FALSE(m_Cache.WriteWishlistFlags(ids, flags));
+  bool flag = false;
+  EXPECT_FALSE(m_Cache.ReadWishlistFlag(1, flag));
+
+  flags.push_back(true);
+  ASSERT_TRUE(m_Cache.WriteWishlistFlags(ids, flags));
+  for (int id = 1; id <= 3; ++id) {
+    ASSERT_TRUE(m_Cache.ReadWishlistFlag(id, flag)) << id;
+    EXPECT_EQ(id != 2, flag) << id;
+  }
+}
+
+TEST_P(CacheKinds, PurgeUserDataByName) {
+  ASSERT_EQ(0, Open(kAllData));
+  ASSERT_TRUE(m_Cache.WriteUserData("getWishlistItems", "0,1,20,0", "page"));
+  ASSERT_TRUE(m_Cache.WriteUserData("getEmailAddress", "", "mail"));
+  ASSERT_TRUE(m_Cache.WriteWishlistFlag(1, true));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getTitleListing", "1", "title"));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getTvEpisodeListing", "2", "episode"));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getAllTvEpisodeListings", "3", "episodes"));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getTitles", "1,1,20,2", "page"));
+
+  // Another name removes only its rows.
+  EXPECT_TRUE(m_Cache.PurgeUserData("getWishlistItems"));
+  EXPECT_FALSE(HasUser(m_Cache, "getWishlistItems", "0,1,20,0"));
+  EXPECT_TRUE(HasUser(m_Cache, "getEmailAddress", ""));
+  EXPECT_TRUE(HasMeta(m_Cache, "getTitleListing", "1"));
+
+  // The wishlist flags take the cached title answers with them, which carry the same flags.
+  EXPECT_TRUE(m_Cache.RemoveAllWishlistFlags());
+  bool flag = false;
+  EXPECT_FALSE(m_Cache.ReadWishlistFlag(1, flag));
+  EXPECT_TRUE(HasUser(m_Cache, "getEmailAddress", ""));
+  EXPECT_FALSE(HasMeta(m_Cache, "getTitleListing", "1"));
+  EXPECT_FALSE(HasMeta(m_Cache, "getTvEpisodeListing", "2"));
+  EXPECT_FALSE(HasMeta(m_Cache, "getAllTvEpisodeListings", "3"));
+  EXPECT_TRUE(HasMeta(m_Cache, "getTitles", "1,1,20,2"));
+}
+
+TEST_P(CacheKinds, PurgeOfAllUserData) {
+  ASSERT_EQ(0, Open(kAllData));
+  ASSERT_TRUE(m_Cache.WriteUserData("getEmailAddress", "", "mail"));
+  ASSERT_TRUE(m_Cache.WriteWishlistFlag(1, true));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getTitleListing", "1", "title"));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getNavigation", "", "nav"));
+  EXPECT_TRUE(m_Cache.PurgeUserData(""));
+  EXPECT_FALSE(HasUser(m_Cache, "getEmailAddress", ""));
+  EXPECT_FALSE(HasUser(m_Cache, "WishlistFlag", "1"));
+  EXPECT_FALSE(HasMeta(m_Cache, "getTitleListing", "1"));
+  EXPECT_TRUE(HasMeta(m_Cache, "getNavigation", ""));
+
+  // Without metadata caching the title answers are not touched (nor readable).
+  ASSERT_TRUE(m_Cache.WriteMetaData("getTitleListing", "1", "title"));
+  ASSERT_EQ(0, Open(4));
+  EXPECT_TRUE(m_Cache.PurgeUserData(""));
+  ASSERT_EQ(0, Open(kAllData));
+  if (GetParam() == kFile) {
+    EXPECT_TRUE(HasMeta(m_Cache, "getTitleListing", "1"));
+  }
+}
+
+// ---- Cache types ---------------------------------------------------------------------------------
+
+TEST(CacheTypes, TypeZeroOpensAndCachesNothing) {
+  CacheMgr cache;
+  EXPECT_EQ(0, cache.Open(Params(0, kAllData, 0)));
+  VLString value("x");
+  EXPECT_FALSE(cache.WriteMetaData("n", "k", "v"));
+  EXPECT_FALSE(cache.ReadMetaData("n", "k", value));
+  EXPECT_EQ("", Str(value));
+  EXPECT_FALSE(cache.UpdateLastCacheLoadTime("t"));
+  EXPECT_FALSE(cache.WriteBoxArt("p", VL_WS_BOXART_95, 1, "", 0, "d"));
+  EXPECT_FALSE(cache.SetBoxArtNeedUpdate());
+  EXPECT_FALSE(cache.WriteUserData("n", "k", "v"));
+  EXPECT_FALSE(cache.PurgeUserData(""));
+  EXPECT_FALSE(cache.WriteWishlistFlag(1, true));
+  EXPECT_FALSE(cache.RemoveWishlistFlag(1));
+  EXPECT_EQ(0, cache.Close());
+}
+
+TEST(CacheTypes, UnknownTypeDoesNotOpen) {
+  CacheMgr cache;
+  EXPECT_NE(0, cache.Open(Params(3, kAllData, 0)));
+  EXPECT_FALSE(cache.WriteMetaData("n", "k", "v"));
+}
+
+TEST(CacheTypes, MemoryCachesAreSeparateAndLostAtClose) {
+  CacheMgr a, b;
+  ASSERT_EQ(0, a.Open(Params(kMemory, kAllData, 0)));
+  ASSERT_EQ(0, b.Open(Params(kMemory, kAllData, 0)));
+  ASSERT_TRUE(a.WriteMetaData("n", "k", "v"));
+  EXPECT_FALSE(HasMeta(b, "n", "k"));
+  a.Close();
+  ASSERT_EQ(0, a.Open(Params(kMemory, kAllData, 0)));
+  EXPECT_FALSE(HasMeta(a, "n", "k"));
+}
+
+TEST(CacheTypes, FileCacheIsSharedAndHoldsNoConnectionBetweenOperations) {
+  VLTestDir dir;
+  std::string path = dir / "c.vl";
+  CacheMgr a, b;
+  ASSERT_EQ(0, a.Open(Params(kFile, kAllData, 0, path)));
+  ASSERT_EQ(0, b.Open(Params(kFile, kAllData, 0, path)));
+  ASSERT_TRUE(a.WriteMetaData("n", "k", "v"));
+  EXPECT_TRUE(HasMeta(b, "n", "k"));
+  // Another program can take the write lock while both caches are open.
+  RunOnFile(path, "BEGIN EXCLUSIVE; DELETE FROM Service; COMMIT;");
+  EXPECT_FALSE(HasMeta(a, "n", "k"));
+}
+
+TEST(CacheTypes, FileThatCannotBeOpenedFailsOpen) {
+  VLTestDir dir;
+  CacheMgr cache;
+  EXPECT_NE(0, cache.Open(Params(kFile, kAllData, 0, dir / "missing/c.vl")));
+  EXPECT_FALSE(cache.WriteMetaData("n", "k", "v"));
+
+  // A file that is not a database: the schema cannot be created.
+  ASSERT_TRUE(VLWriteFile(dir / "junk.vl", std::string(4096, 'j')));
+  EXPECT_NE(0, cache.Open(Params(kFile, kAllData, 0, dir / "junk.vl")));
+  EXPECT_FALSE(cache.WriteMetaData("n", "k", "v"));
+}
+
+TEST(CacheTypesDeathTest, ExecuteSQLNeedsAConnection) {
+  GTEST_FLAG_SET(death_test_style, "threadsafe");
+  VLTestDir dir;
+  CacheMgr cache;
+  ASSERT_EQ(0, cache.Open(Params(kFile, kAllData, 0, dir / "c.vl")));
+  VLString text;
+  unsigned number = 0;
+  EXPECT_DEATH(cache.ExecuteSQL("SELECT 1", text), "m_DB != 0");
+  EXPECT_DEATH(cache.ExecuteSQL("SELECT 1", number), "m_DB != 0");
+}
+
+TEST(CacheTypes, ExecuteSQLReadsTheFirstColumnOfTheFirstRow) {
+  CacheMgr cache;
+  ASSERT_EQ(0, cache.Open(Params(kMemory, kAllData, 0)));
+  ASSERT_TRUE(cache.WriteMetaData("a", "1", "xyz"));
+  ASSERT_TRUE(cache.WriteMetaData("b", "1", "pq"));
+  VLString text("old");
+  unsigned number = 9;
+  EXPECT_EQ(0, cache.ExecuteSQL("SELECT Name FROM Service ORDER BY Name", text));
+  EXPECT_EQ("a", Str(text));
+  EXPECT_EQ(0, cache.ExecuteSQL("SELECT SUM(Size) FROM Service", number));
+  EXPECT_EQ(5u, number);
+  EXPECT_EQ(0, cache.ExecuteSQL("SELECT 4294967298", number));
+  EXPECT_EQ(2u, number);  // truncated to 32 bits
+  EXPECT_EQ(0, cache.ExecuteSQL("DELETE FROM Service", text));
+  EXPECT_EQ("", Str(text));
+  EXPECT_NE(0, cache.ExecuteSQL("SELECT nonsense FROM nowhere", number));
+  EXPECT_EQ(0u, number);
+}
+
+// ---- Box-art eviction ----------------------------------------------------------------------------
+
+// Eleven titles of one size, oldest first, plus a second, newest size of the oldest title. The
+// write that finds the total over budget deletes every row of the ten oldest titles, both sizes
+// of the oldest one included, and their image files.
+TEST(BoxArtEviction, RemovesEverySizeOfTheOldestTitlesWithTheirFiles) {
+  VLTestDir dir;
+  std::string path = dir / "c.vl";
+  CacheMgr cache;
+  ASSERT_EQ(0, cache.Open(Params(kFile, 2, 1000, path)));
+  ASSERT_EQ(1000u, cache.BoxArtLimit());
+  for (int i = 0; i <= 10; ++i) {
+    std::string prefix = "t" + std::to_string(i);
+    ASSERT_TRUE(cache.WriteBoxArt(prefix.c_str(), VL_WS_BOXART_95, 90, "", 0, ""));
+    ASSERT_TRUE(VLWriteFile(dir / (prefix + "95.jpg"), "img"));
+  }
+  ASSERT_TRUE(cache.WriteBoxArt("t0", VL_WS_BOXART_135S, 10, "", 0, ""));
+  ASSERT_TRUE(VLWriteFile(dir / "t0135.jpg", "img"));
+  RunOnFile(path,
+            "UPDATE BoxArt SET TS = datetime('2011-01-01', '+' || substr(Prefix, 2) || ' minutes');"
+            "UPDATE BoxArt SET TS = '2012-01-01 00:00:00' WHERE Dim = 6;");
+
+  // 11 * 90 + 10 = 1000: not above the budget, so this write evicts nothing.
+  ASSERT_TRUE(cache.WriteBoxArt("new", VL_WS_BOXART_95, 5, "", 0, ""));
+  unsigned size, needUpdate;
+  VLString lastModified, data;
+  EXPECT_TRUE(cache.ReadBoxArt("t0", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+
+  // 1005 is above: t0 to t9 go, t10 and the new image stay.
+  ASSERT_TRUE(cache.WriteBoxArt("newer", VL_WS_BOXART_95, 5, "", 0, ""));
+  for (int i = 0; i <= 9; ++i) {
+    std::string prefix = "t" + std::to_string(i);
+    EXPECT_FALSE(cache.ReadBoxArt(prefix.c_str(), VL_WS_BOXART_95, size, lastModified,
+                                  needUpdate, data))
+        << prefix;
+    EXPECT_FALSE(VLFile::Exist((dir / (prefix + "95.jpg")).c_str())) << prefix;
+  }
+  EXPECT_FALSE(cache.ReadBoxArt("t0", VL_WS_BOXART_135S, size, lastModified, needUpdate, data));
+  EXPECT_FALSE(VLFile::Exist((dir / "t0135.jpg").c_str()));
+  EXPECT_TRUE(cache.ReadBoxArt("t10", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_TRUE(VLFile::Exist((dir / "t1095.jpg").c_str()));
+  EXPECT_TRUE(cache.ReadBoxArt("new", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_TRUE(cache.ReadBoxArt("newer", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+}
+
+TEST(BoxArtEviction, MemoryCacheEvictsRowsOnly) {
+  VLTestDir dir;
+  CacheMgr cache;
+  ASSERT_EQ(0, cache.Open(Params(kMemory, 2, 1000)));
+  ASSERT_TRUE(VLWriteFile(dir / "a95.jpg", "img"));
+  ASSERT_TRUE(cache.WriteBoxArt("a", VL_WS_BOXART_95, 1001, "", 0, "bytes"));
+  ASSERT_TRUE(cache.WriteBoxArt("b", VL_WS_BOXART_95, 1, "", 0, "bytes"));
+  unsigned size, needUpdate;
+  VLString lastModified, data;
+  EXPECT_FALSE(cache.ReadBoxArt("a", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_TRUE(cache.ReadBoxArt("b", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_TRUE(VLFile::Exist((dir / "a95.jpg").c_str()));
+}
+
+// ---- Two handles on one file ---------------------------------------------------------------------
+
+// Each thread works through its own CacheMgr on the same file, as duplicated client handles do,
+// and reads back everything it wrote: a busy database must make an operation wait, never turn
+// into a miss or a lost write.
+TEST(CacheSharing, TwoObjectsOnOneFileFromTwoThreadsLoseNothing) {
+  VLTestDir dir;
+  const std::string path = dir / "shared.vl";
+  const int kRounds = 400;
+  int failures[2] = {0, 0};
+
+  auto work = [&](int thread) {
+    CacheMgr cache;
+    if (cache.Open(Params(kFile, kAllData, 0, path)) != 0) {
+      ++failures[thread];
+      return;
+    }
+    for (int i = 0; i < kRounds; ++i) {
+      std::string key = std::to_string(thread) + "," + std::to_string(i);
+      VLString value;
+      bool flag = false;
+      unsigned size = 0, needUpdate = 0;
+      VLString lastModified, data;
+      int title = thread * 100000 + i;
+      if (!cache.WriteMetaData("getTitles", key.c_str(), ("page " + key).c_str())) ++failures[thread];
+      if (!cache.ReadMetaData("getTitles", key.c_str(), value) || Str(value) != "page " + key) {
+        ++failures[thread];
+      }
+      if (!cache.WriteWishlistFlag(title, true)) ++failures[thread];
+      if (!cache.ReadWishlistFlag(title, flag) || !flag) ++failures[thread];
+      if (!cache.WriteBoxArt(key.c_str(), VL_WS_BOXART_95, i, "lm", 0, "")) ++failures[thread];
+      if (!cache.ReadBoxArt(key.c_str(), VL_WS_BOXART_95, size, lastModified, needUpdate, data) ||
+          size != static_cast<unsigned>(i)) {
+        ++failures[thread];
+      }
+      if (!cache.SetBoxArtNeedUpdate()) ++failures[thread];
+    }
+  };
+  std::thread first(work, 0), second(work, 1);
+  first.join();
+  second.join();
+  EXPECT_EQ(0, failures[0]);
+  EXPECT_EQ(0, failures[1]);
+
+  // Nothing either thread wrote is missing afterwards.
+  CacheMgr check;
+  ASSERT_EQ(0, check.Open(Params(kFile, kAllData, 0, path)));
+  for (int thread = 0; thread < 2; ++thread) {
+    for (int i = 0; i < kRounds; ++i) {
+      std::string key = std::to_string(thread) + "," + std::to_string(i);
+      bool flag = false;
+      EXPECT_TRUE(HasMeta(check, "getTitles", key.c_str())) << key;
+      EXPECT_TRUE(check.ReadWishlistFlag(thread * 100000 + i, flag)) << key;
+    }
+  }
+}
+
+}  // namespace
