@@ -1,8 +1,25 @@
-// VL_WS_Client.h: the client state behind a VL_WS_Handle (tag 1).
+// VL_WS_Client.h: the client state behind a VL_WS_Handle (tag 1). One block per handle, never
+// shared: its three SOAP service objects, the dispatcher of account operations, the handle's
+// own settings and its cache.
 #ifndef VL_WS_CLIENT_H
 #define VL_WS_CLIENT_H
 
+#include "CacheInterface.h"
+#include "DownloadAPI.h"
+#include "RealTimeBrowse.h"
+#include "StreamAPI.h"
+#include "StreamDownloadAPI.h"
+#include "VL_WS_SetupParams2.h"
 #include "VL_WS_Types.h"
+
+struct VL_WS_Client {
+  RealTimeBrowse m_RealTimeBrowse;        // the catalogue service
+  StreamAPI m_StreamAPI;                  // the streaming service
+  DownloadAPI m_DownloadAPI;              // the download/account service
+  StreamDownloadAPI m_StreamDownloadAPI;  // routes account operations by access type
+  VL_WS_SetupParams2 m_Params;            // the handle's settings; the services point at them
+  CacheInterface* m_Cache = nullptr;      // null when the handle has no cache
+};
 
 // Frees a handle's client state: closes and deletes its cache, then destroys its settings, the
 // dispatcher and the three service objects. VL_WS_release calls it for a handle that has one.
