@@ -4,9 +4,13 @@
 
 #include "VLAssert.h"
 
+// Text content is kept as UTF-8 bytes in both directions, as in the service contexts: without
+// SOAP_C_UTFSTRING the runtime would take every byte above 0x7F for a Latin-1 character, writing
+// UTF-8 text double-encoded and folding characters above U+00FF of a file written by hand.
 Serializer::Serializer(bool compress, bool indent)
-    : soap(SOAP_ENC_XML,
-           SOAP_ENC_XML | (compress ? SOAP_ENC_ZLIB : 0) | (indent ? SOAP_XML_INDENT : 0)) {
+    : soap(SOAP_ENC_XML | SOAP_C_UTFSTRING, SOAP_ENC_XML | SOAP_C_UTFSTRING |
+                                                (compress ? SOAP_ENC_ZLIB : 0) |
+                                                (indent ? SOAP_XML_INDENT : 0)) {
   user = this;
   fsend = Serializer_fsend;
   frecv = Serializer_frecv;

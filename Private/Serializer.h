@@ -24,8 +24,8 @@ class Serializer : public soap {
   // The element tag of every stored record.
   static constexpr const char* kElementTag = "DUDUVud";
 
-  // Plain XML without envelope or HTTP in both directions; compress makes the output a gzip
-  // stream, indent indents the output.
+  // Plain XML without envelope or HTTP, UTF-8 text kept as it is, in both directions; compress
+  // makes the output a gzip stream, indent indents the output.
   Serializer(bool compress, bool indent);
   virtual ~Serializer();
   Serializer(const Serializer&) = delete;
