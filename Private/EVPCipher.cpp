@@ -83,7 +83,7 @@ bool EVPCipher::GenerateKeyIV(const VLString& password) {
 bool EVPCipher::Run(bool encrypt, const unsigned char* in, unsigned n, unsigned char* out,
                     unsigned& outLen) {
   int updated = 0, finished = 0;
-  if (n > INT_MAX - m_Impl->block_size) return false;
+  if (!m_Impl->ctx || n > INT_MAX - m_Impl->block_size) return false;
   if (EVP_CipherInit_ex(m_Impl->ctx, m_Impl->cipher, NULL, m_Impl->key.data(), m_Impl->iv.data(),
                         encrypt ? 1 : 0) != 1 ||
       EVP_CipherUpdate(m_Impl->ctx, out, &updated, in, static_cast<int>(n)) != 1 ||
