@@ -1,6 +1,7 @@
 #include "EVPCipher.h"
 
 #include <limits.h>
+#include <openssl/err.h>
 #include <openssl/evp.h>
 #include <openssl/provider.h>
 #include <string.h>
@@ -22,16 +23,40 @@ int AlphabetIndex(char c) {
   return p ? static_cast<int>(p - kAlphabet) : -1;
 }
 
-// OpenSSL 3 keeps Blowfish in its legacy provider. Loading any provider by name ends the
-// automatic loading of the default one, so both are loaded, once per process, on first use of
-// Blowfish. The handles stay loaded until OpenSSL's own clean-up at exit.
-void LoadLegacyProvider() {
-  static const bool loaded = [] {
-    OSSL_PROVIDER* standard = OSSL_PROVIDER_load(NULL, "default");
-    OSSL_PROVIDER* legacy = OSSL_PROVIDER_load(NULL, "legacy");
-    return standard != NULL && legacy != NULL;
-  }();
-  (void)loaded;  // without the legacy provider Blowfish fails like any cipher failure
+// OpenSSL 3 keeps Blowfish in its legacy provider. It is loaded, with the default provider, into
+// a library context of our own, once per process on first use, so that the host's own use of
+// OpenSSL sees no change. Everything is released at exit, before OpenSSL's own clean-up.
+class BlowfishProvider {
+ public:
+  BlowfishProvider()
+      : m_Context(OSSL_LIB_CTX_new()), m_Default(NULL), m_Legacy(NULL), m_Cipher(NULL) {
+    if (!m_Context) return;
+    m_Default = OSSL_PROVIDER_load(m_Context, "default");
+    m_Legacy = OSSL_PROVIDER_load(m_Context, "legacy");
+    m_Cipher = EVP_CIPHER_fetch(m_Context, "BF-CBC", NULL);
+  }
+  ~BlowfishProvider() {
+    EVP_CIPHER_free(m_Cipher);
+    if (m_Legacy) OSSL_PROVIDER_unload(m_Legacy);
+    if (m_Default) OSSL_PROVIDER_unload(m_Default);
+    OSSL_LIB_CTX_free(m_Context);
+  }
+  BlowfishProvider(const BlowfishProvider&) = delete;
+  BlowfishProvider& operator=(const BlowfishProvider&) = delete;
+
+  // Null when the legacy provider is not installed.
+  const EVP_CIPHER* Cipher() const { return m_Cipher; }
+
+ private:
+  OSSL_LIB_CTX* m_Context;
+  OSSL_PROVIDER* m_Default;
+  OSSL_PROVIDER* m_Legacy;
+  EVP_CIPHER* m_Cipher;
+};
+
+const EVP_CIPHER* Blowfish() {
+  static BlowfishProvider provider;
+  return provider.Cipher();
 }
 
 }  // namespace
@@ -47,12 +72,12 @@ struct EVPCipher::Impl {
 };
 
 EVPCipher::EVPCipher(ALGO algo) : m_Impl(new Impl) {
-  if (algo == BLOWFISH_CBC) LoadLegacyProvider();
   m_Impl->ctx = EVP_CIPHER_CTX_new();
-  m_Impl->cipher = algo == BLOWFISH_CBC ? EVP_bf_cbc() : EVP_aes_128_cbc();
-  m_Impl->key_len = EVP_CIPHER_key_length(m_Impl->cipher);
-  m_Impl->iv_len = EVP_CIPHER_iv_length(m_Impl->cipher);
-  m_Impl->block_size = EVP_CIPHER_block_size(m_Impl->cipher);
+  m_Impl->cipher = algo == BLOWFISH_CBC ? Blowfish() : EVP_aes_128_cbc();
+  // Without a cipher every size is 0: no password fits, and every Encrypt and Decrypt fails.
+  m_Impl->key_len = m_Impl->cipher ? EVP_CIPHER_key_length(m_Impl->cipher) : 0;
+  m_Impl->iv_len = m_Impl->cipher ? EVP_CIPHER_iv_length(m_Impl->cipher) : 0;
+  m_Impl->block_size = m_Impl->cipher ? EVP_CIPHER_block_size(m_Impl->cipher) : 0;
   m_Impl->key.resize(m_Impl->key_len);
   m_Impl->iv.resize(m_Impl->iv_len);
 }
@@ -83,11 +108,14 @@ bool EVPCipher::GenerateKeyIV(const VLString& password) {
 bool EVPCipher::Run(bool encrypt, const unsigned char* in, unsigned n, unsigned char* out,
                     unsigned& outLen) {
   int updated = 0, finished = 0;
-  if (!m_Impl->ctx || n > INT_MAX - m_Impl->block_size) return false;
+  if (!m_Impl->ctx || !m_Impl->cipher || n > INT_MAX - m_Impl->block_size) return false;
   if (EVP_CipherInit_ex(m_Impl->ctx, m_Impl->cipher, NULL, m_Impl->key.data(), m_Impl->iv.data(),
                         encrypt ? 1 : 0) != 1 ||
       EVP_CipherUpdate(m_Impl->ctx, out, &updated, in, static_cast<int>(n)) != 1 ||
       EVP_CipherFinal_ex(m_Impl->ctx, out + updated, &finished) != 1) {
+    // A wrong password is an expected failure: leave no error in this thread's OpenSSL queue,
+    // where a later TLS call would take it for its own.
+    ERR_clear_error();
     return false;
   }
   outLen = static_cast<unsigned>(updated + finished);

@@ -20,7 +20,8 @@ class EVPCipher {
     AES_128_CBC = 1,  // the settings files' cipher
   };
 
-  // BLOWFISH_CBC selects Blowfish-CBC; any other value AES-128-CBC.
+  // BLOWFISH_CBC selects Blowfish-CBC (from OpenSSL's legacy provider: without it installed,
+  // every Blowfish operation fails); any other value AES-128-CBC.
   explicit EVPCipher(ALGO algo);
   ~EVPCipher();
   EVPCipher(const EVPCipher&) = delete;

@@ -2,6 +2,8 @@
 // texts computed independently with the openssl command-line tool.
 #include <gtest/gtest.h>
 
+#include <openssl/err.h>
+#include <openssl/evp.h>
 #include <string.h>
 
 #include <set>
@@ -59,6 +61,16 @@ TEST(EVPCipher, PinnedCipherTexts) {
             Str(blowfish.Encrypt("Hello, settings!", kPassword)));
   EXPECT_EQ("Hello, settings!",
             Str(blowfish.Decrypt("ab2c0cfbedd44c27d7d993fbb97ad3ab2d657df3afa73c9c", kPassword)));
+}
+
+// Blowfish comes from a library context of the cipher's own: the host process's OpenSSL still
+// has no legacy provider.
+TEST(EVPCipher, BlowfishLeavesTheHostsOpenSSLAlone) {
+  EVPCipher blowfish(EVPCipher::BLOWFISH_CBC);
+  ASSERT_FALSE(blowfish.Encrypt("x", kPassword).empty());
+  EVP_CIPHER* global = EVP_CIPHER_fetch(NULL, "BF-CBC", NULL);
+  EXPECT_EQ(nullptr, global);
+  EVP_CIPHER_free(global);
 }
 
 TEST(EVPCipher, BothCiphersRoundTrip) {
@@ -123,6 +135,7 @@ TEST(EVPCipher, BadInputGivesEmptyText) {
   VLString damaged = encrypted;
   damaged[31] = damaged[31] == '0' ? '1' : '0';
   EXPECT_TRUE(cipher.Decrypt(damaged, kPassword).empty());
+  EXPECT_EQ(0u, ERR_peek_error());  // nothing left for the next TLS call of this thread
   EXPECT_EQ("value", Str(cipher.Decrypt(encrypted, kPassword)));  // the context is reusable
 }
 
