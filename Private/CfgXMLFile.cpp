@@ -132,7 +132,8 @@ bool ReplaceFile(const VLString& path, const VLString& text) {
   }
   // Syncing the folder makes the rename itself durable. Where a file system cannot sync a
   // folder, the rename still stands and the next sync of the file system writes it.
-  int folder = open(VLFile::GetFolderName(replaced.c_str()).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+  VLString folderName = VLFile::GetFolderName(replaced.c_str());
+  int folder = open(folderName.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
   if (folder >= 0) {
     fsync(folder);
     close(folder);

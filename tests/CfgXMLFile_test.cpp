@@ -101,12 +101,13 @@ TEST(CfgXMLFile, FilesThatHoldNoSetting) {
 
   // A file of settings written by hand: a setting without a key never matches but is kept, only
   // the first of two settings with one key counts, and a setting without a value reads empty.
-  ASSERT_TRUE(VLWriteFile(dir / "hand.xml",
-                          "<DUDUVud xmlns:VL1=\"http://store.ostrel.example/api/\">"
-                          "<VL1:Configuration><VL1:Value>orphan</VL1:Value></VL1:Configuration>"
-                          "<VL1:Configuration Key=\"K\"><VL1:Value>one</VL1:Value></VL1:Configuration>"
-                          "<VL1:Configuration Key=\"K\"><VL1:Value>two</VL1:Value></VL1:Configuration>"
-                          "<VL1:Configuration Key=\"N\"/></DUDUVud>"));
+  ASSERT_TRUE(VLWriteFile(
+      dir / "hand.xml",
+      "<DUDUVud xmlns:VL1=\"http://store.ostrel.example/api/\">"
+      "<VL1:Configuration><VL1:Value>orphan</VL1:Value></VL1:Configuration>"
+      "<VL1:Configuration Key=\"K\"><VL1:Value>one</VL1:Value></VL1:Configuration>"
+      "<VL1:Configuration Key=\"K\"><VL1:Value>two</VL1:Value></VL1:Configuration>"
+      "<VL1:Configuration Key=\"N\"/></DUDUVud>"));
   EXPECT_READ(dir / "hand.xml", "K", false, CFG_OK, "one");
   EXPECT_READ(dir / "hand.xml", "N", false, CFG_OK, "");
   ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(dir / "hand.xml", "K", "three"));
@@ -182,7 +183,8 @@ TEST(CfgXMLFile, DamagedPackedValues) {
   EXPECT_EQ(68u, packed.length());
 
   VLString gotPassword, gotCipherText;
-  ASSERT_EQ(CfgXMLFile::CFG_OK, CfgXMLFile::UnPackEncryptedValue(packed, gotPassword, gotCipherText));
+  ASSERT_EQ(CfgXMLFile::CFG_OK,
+            CfgXMLFile::UnPackEncryptedValue(packed, gotPassword, gotCipherText));
   EXPECT_EQ(password, Str(gotPassword));
   EXPECT_EQ(Str(cipherText), Str(gotCipherText));
 

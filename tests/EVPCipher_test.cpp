@@ -48,7 +48,8 @@ TEST(EVPCipher, TextEncoding) {
 }
 
 TEST(EVPCipher, PinnedCipherTexts) {
-  // printf 'Hello, settings!' | openssl enc -aes-128-cbc -K <key> -iv 00112233041526378091a2b38495a6b7
+  // printf 'Hello, settings!' |
+  //   openssl enc -aes-128-cbc -K <key> -iv 00112233041526378091a2b38495a6b7
   EVPCipher aes(EVPCipher::AES_128_CBC);
   EXPECT_EQ("f5428afa08589ad17e94d42d83a2e98f73f3b8d9cb139bfbbcc07cde67973e04",
             Str(aes.Encrypt("Hello, settings!", kPassword)));

@@ -134,7 +134,8 @@ class SerializerTest : public ::testing::Test {
     ASSERT_NE(nullptr, rent->AvailableAssets);
     ASSERT_EQ(2, rent->AvailableAssets->__sizeFileProfile);
     EXPECT_EQ(VL1__FileProfile__STANDARD, rent->AvailableAssets->FileProfile[0]);
-    EXPECT_EQ(VL1__FileProfile__HIGH_USCOREDEFINITION_USCORE3D, rent->AvailableAssets->FileProfile[1]);
+    EXPECT_EQ(VL1__FileProfile__HIGH_USCOREDEFINITION_USCORE3D,
+              rent->AvailableAssets->FileProfile[1]);
     ASSERT_NE(nullptr, rent->AvailableAudioProfiles);
     ASSERT_EQ(1, rent->AvailableAudioProfiles->__sizeAudioFile);
     const VL1__AudioFile* audio = rent->AvailableAudioProfiles->AudioFile[0];
