@@ -247,8 +247,9 @@ void VLSimConnection::Close(bool graceful) {
   m_Fd = -1;
 }
 
-int VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,
-                      const std::vector<VLSimFault>& faults, VLSimStopSignal& stop) {
+VLSimSent VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,
+                            const std::vector<VLSimFault>& faults, VLSimStopSignal& stop) {
+  VLSimSent sent;
   bool cut = false;
   long lengthDelta = 0;
   int trickle = -1;
@@ -256,13 +257,13 @@ int VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,
     switch (fault.mode) {
       case VLSimFault::kDelay:
         if (!stop.Sleep(fault.arg)) {
-          connection.Close(false);
-          return 0;
+          sent.abrupt = true;
+          return sent;
         }
         break;
       case VLSimFault::kClose:
-        connection.Close(false);
-        return 0;
+        sent.abrupt = true;
+        return sent;
       case VLSimFault::kStatus:
         response = VLSimHttpResponse::Page(fault.arg, "Injected by the simulator.");
         break;
@@ -304,17 +305,18 @@ int VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,
   message += "Connection: close\r\n\r\n";
   message += cut ? response.body.substr(0, response.body.size() / 2) : response.body;
 
-  bool sent = true;
+  bool written = true;
   if (trickle >= 0) {
-    for (size_t pos = 0; sent && pos < message.size(); pos += kTricklePiece) {
-      if (pos > 0 && !stop.Sleep(trickle)) sent = false;
-      else sent = connection.Write(message.substr(pos, kTricklePiece));
+    for (size_t pos = 0; written && pos < message.size(); pos += kTricklePiece) {
+      if (pos > 0 && !stop.Sleep(trickle)) written = false;
+      else written = connection.Write(message.substr(pos, kTricklePiece));
     }
   } else {
-    sent = connection.Write(message);
+    written = connection.Write(message);
   }
-  connection.Close(sent && !cut && lengthDelta <= 0);
-  return response.status;
+  sent.status = response.status;
+  sent.abrupt = !written || cut || lengthDelta > 0;
+  return sent;
 }
 
 std::string VLSimURLDecode(const std::string& text, bool plusIsSpace) {

@@ -89,10 +89,15 @@ class VLSimConnection {
 };
 
 // Sends response on connection, shaped by the transport faults among faults (delay, close, cut,
-// status, malformed, truncated, gzip, deflate, badlength, trickle), then closes the connection.
-// Returns the HTTP status actually announced (0 when nothing was sent).
-int VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,
-                      const std::vector<VLSimFault>& faults, VLSimStopSignal& stop);
+// status, malformed, truncated, gzip, deflate, badlength, trickle). The caller closes the
+// connection afterwards (so it can log the exchange before the client sees the end of it):
+// abruptly when abrupt is set, else gracefully.
+struct VLSimSent {
+  int status = 0;  // the HTTP status sent, 0 when nothing was sent
+  bool abrupt = false;
+};
+VLSimSent VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,
+                            const std::vector<VLSimFault>& faults, VLSimStopSignal& stop);
 
 // Percent-decoding of a URL path or query component ("%20" and "+" in queries).
 std::string VLSimURLDecode(const std::string& text, bool plusIsSpace);

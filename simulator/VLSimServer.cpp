@@ -291,6 +291,7 @@ void VLSimServer::Impl::Serve(int fd, bool tls, int number) {
     }
     VLSimHttpRequest request;
     std::string problem;
+    bool graceful = ready;
     if (!ready) {
       entry.note = "TLS handshake failed";
       context.log.Add(entry);
@@ -308,11 +309,13 @@ void VLSimServer::Impl::Serve(int fd, bool tls, int number) {
                                                    : VLSimHttpResponse::Page(400, problem);
       if (!problem.empty()) entry.note = problem;
       for (const VLSimFault& fault : faults) entry.faults += (entry.faults.empty() ? "" : " ") + fault.ToString();
-      entry.status = VLSimSendResponse(connection, response, faults, context.stop);
+      VLSimSent sent = VLSimSendResponse(connection, response, faults, context.stop);
+      entry.status = sent.status;
+      graceful = !sent.abrupt;
       context.log.Add(entry);
       if (context.options.printRequests) std::cout << VLSimRequestLog::Format(entry) << std::endl;
     }
-    connection.Close(true);
+    connection.Close(graceful);
     std::lock_guard<std::mutex> lock(workersMutex);
     openSockets.erase(fd);
   }
