@@ -1,8 +1,16 @@
 #include "VLSimRequestLog.h"
 
+#include <chrono>
+
 void VLSimRequestLog::Add(const VLSimRequest& request) {
   std::lock_guard<std::mutex> lock(m_Mutex);
   m_Entries.push_back(request);
+  m_Added.notify_all();
+}
+
+bool VLSimRequestLog::WaitFor(size_t count, int milliseconds) {
+  std::unique_lock<std::mutex> lock(m_Mutex);
+  return m_Added.wait_for(lock, std::chrono::milliseconds(milliseconds), [&] { return m_Entries.size() >= count; });
 }
 
 std::vector<VLSimRequest> VLSimRequestLog::Entries() {

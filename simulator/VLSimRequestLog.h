@@ -3,6 +3,7 @@
 #ifndef VLSIMREQUESTLOG_H
 #define VLSIMREQUESTLOG_H
 
+#include <condition_variable>
 #include <mutex>
 #include <string>
 #include <vector>
@@ -41,11 +42,14 @@ class VLSimRequestLog {
   void Add(const VLSimRequest& request);
   std::vector<VLSimRequest> Entries();
   void Clear();
+  // Waits until the log holds at least count entries; false after milliseconds without.
+  bool WaitFor(size_t count, int milliseconds);
   // One line per entry for the simulator's console.
   static std::string Format(const VLSimRequest& request);
 
  private:
   std::mutex m_Mutex;
+  std::condition_variable m_Added;
   std::vector<VLSimRequest> m_Entries;
 };
 

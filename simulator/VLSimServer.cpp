@@ -332,6 +332,9 @@ VLSimStore& VLSimServer::Store() { return *m_Impl->context.store; }
 const VLSimCatalogue& VLSimServer::Catalogue() const { return m_Impl->context.catalogue; }
 std::vector<VLSimRequest> VLSimServer::Requests() { return m_Impl->context.log.Entries(); }
 void VLSimServer::ClearRequests() { m_Impl->context.log.Clear(); }
+bool VLSimServer::WaitForRequests(size_t count, int milliseconds) {
+  return m_Impl->context.log.WaitFor(count, milliseconds);
+}
 void VLSimServer::AddFault(const VLSimFault& fault) { m_Impl->context.faults.Add(fault); }
 void VLSimServer::ClearFaults() { m_Impl->context.faults.Clear(); }
 

@@ -70,8 +70,12 @@ class VLSimServer {
   VLSimStore& Store();
   const VLSimCatalogue& Catalogue() const;
 
+  // The request log. An entry is complete before the client sees the end of its answer, except
+  // for a refused TLS handshake, which the client may notice first: WaitForRequests waits until
+  // the log holds count entries (false after milliseconds).
   std::vector<VLSimRequest> Requests();
   void ClearRequests();
+  bool WaitForRequests(size_t count, int milliseconds);
 
   bool AddFault(const std::string& spec, std::string* error);
   void AddFault(const VLSimFault& fault);

@@ -184,6 +184,7 @@ TEST_F(SimulatorHttp, EveryLogicalHostVerifiesAgainstTheTestCA) {
   EXPECT_EQ(6, hosts);
   VLSimTestReply stranger = Secure("elsewhere.example", "/");
   EXPECT_FALSE(stranger.connected) << "no SAN for other names, and the CN matches none";
+  ASSERT_TRUE(m_Sim.WaitForRequests(hosts + 1, 5000));
   EXPECT_EQ(404, Plain("elsewhere.example", "/device/time/").status);
   EXPECT_EQ("unknown host", m_Sim.Requests().back().note);
 }
@@ -192,7 +193,9 @@ TEST_F(SimulatorHttp, TlsFaultsPresentCertificatesAVerifyingClientRefuses) {
   for (const char* kind : {"selfsigned", "wronghost", "expired"}) {
     SCOPED_TRACE(kind);
     Fault(std::string(VL_STORE_STAGING_HOST) + "=tls:" + kind + ",times=1");
+    m_Sim.ClearRequests();
     EXPECT_FALSE(Secure(VL_STORE_STAGING_HOST, "/").connected);
+    ASSERT_TRUE(m_Sim.WaitForRequests(1, 5000));
     EXPECT_EQ("TLS handshake failed", m_Sim.Requests().back().note);
     EXPECT_EQ(std::string("tls:") + kind, m_Sim.Requests().back().faults);
     EXPECT_TRUE(Secure(VL_STORE_STAGING_HOST, "/").connected) << "times=1";
