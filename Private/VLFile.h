@@ -12,7 +12,7 @@ typedef int64_t vl_int64;
 
 class VLFile {
  public:
-  static const char PATH_SEPERATOR = '/';
+  static constexpr char PATH_SEPERATOR = '/';
 
   VLFile();
   ~VLFile();  // closes an open stream

@@ -11,6 +11,7 @@
 #include <set>
 #include <string>
 
+#include "VLAutoCharPtr.h"
 #include "VLTestDir.h"
 #include "VLUtilities.h"
 
@@ -28,6 +29,21 @@ TEST(VLUtilities, StrDupAlwaysGivesAnOwnedText) {
     EXPECT_STREQ(expected[i], copy);
     delete[] copy;
   }
+}
+
+TEST(VLUtilities, AutoCharPtrOwnsStrDupTexts) {
+  // The sanitizer build reports a leak or a double release here.
+  VLAutoCharPtr text(VLUtilities::StrDup("first"));
+  EXPECT_STREQ("first", text.get());
+  text.reset(VLUtilities::StrDup("second"));
+  EXPECT_STREQ("second", text.get());
+  text.reset(text.get());
+  EXPECT_STREQ("second", text.get());
+  char* kept = text.release();
+  EXPECT_EQ(nullptr, text.get());
+  text.reset(kept);
+  VLAutoCharPtr none;
+  EXPECT_EQ(nullptr, none.get());
 }
 
 TEST(VLUtilities, TextConversions) {

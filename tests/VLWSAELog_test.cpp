@@ -37,21 +37,6 @@ std::vector<int> ActiveAreas() {
   return active;
 }
 
-TEST_F(VLWSAELogTest, AreaTableNamesAndBits) {
-  const char* names[] = {"VL_WSAE", "VL_WSCFGAE", "soap_proxy", "soap_recv", "soap_sent", "soap_test"};
-  unsigned bits[] = {0x100, 0x200, 0x400, 0x800, 0x1000, 0x2000};
-  for (int i = 0; i < VLWSAELog::kAreaCount; ++i) {
-    EXPECT_STREQ(names[i], VLWSAELog::m_areainfos[i].name);
-    EXPECT_EQ(bits[i], VLWSAELog::m_areainfos[i].bit);
-  }
-  EXPECT_STREQ("VL_WSAE", VLWSAELOG_AREA_NAME);
-  EXPECT_STREQ("VL_WSCFGAE", VLWSAE_CFGLOG_AREA_NAME);
-  EXPECT_STREQ("soap_proxy", VLWS_SoapProxyLOG_AREA_NAME);
-  EXPECT_STREQ("soap_recv", VLWS_SoapRecvLOG_AREA_NAME);
-  EXPECT_STREQ("soap_sent", VLWS_SoapSentLOG_AREA_NAME);
-  EXPECT_STREQ("soap_test", VLWS_SoapTestLOG_AREA_NAME);
-}
-
 TEST_F(VLWSAELogTest, MaskActivatesExactlyItsAreas) {
   EXPECT_EQ(0, VLWSAELog::InitWSLogs(256, 1, ""));
   EXPECT_EQ(std::vector<int>({1, 0, 0, 0, 0, 0}), ActiveAreas());

@@ -1,0 +1,5 @@
+#include "DownloadAPI.h"
+
+DownloadAPI::DownloadAPI() : VLServiceObject("DownloadAPI.asmx") {}
+
+DownloadAPI::~DownloadAPI() {}

@@ -1,0 +1,5 @@
+#include "RealTimeBrowse.h"
+
+RealTimeBrowse::RealTimeBrowse() : VLServiceObject("RealTimeBrowse.asmx") {}
+
+RealTimeBrowse::~RealTimeBrowse() {}

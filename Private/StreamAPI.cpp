@@ -1,0 +1,5 @@
+#include "StreamAPI.h"
+
+StreamAPI::StreamAPI() : VLServiceObject("StreamAPI.asmx") {}
+
+StreamAPI::~StreamAPI() {}

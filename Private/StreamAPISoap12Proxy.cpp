@@ -1,0 +1,63 @@
+#include "StreamAPISoap12Proxy.h"
+
+#include "VLStoreHosts.h"
+
+// Used only while no endpoint is set, which does not happen once the service object is bound.
+#define VL_FALLBACK_ENDPOINT "http://" VL_STORE_STAGING_API_HOST "/api/StreamAPI.asmx"
+
+StreamAPISoap12Proxy::StreamAPISoap12Proxy() : VLSoapProxy("StreamAPISoap12Proxy", VL_FALLBACK_ENDPOINT) {
+  StreamAPISoap12Proxy_init(SOAP_C_UTFSTRING, SOAP_C_UTFSTRING);
+}
+
+StreamAPISoap12Proxy::~StreamAPISoap12Proxy() {}
+
+void StreamAPISoap12Proxy::StreamAPISoap12Proxy_init(int imode, int omode) { Init(imode, omode); }
+
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getStreamingNavigation, getStreamingNavigation)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, searchForTitle, searchForTitle)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getGenreLabel, getGenreLabel)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTitlesByGenreCSV, getTitlesByGenreCSV)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTitlesByGenreArray, getTitlesByGenreArray)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTitlesByStreamingNavigation, getTitlesByStreamingNavigation)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTitleListing, getTitleListing)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTvEpisodeListByTitleID, getTvEpisodeListByTitleID)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTvEpisodeListing, getTvEpisodeListing)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getAllTvEpisodeListings, getAllTvEpisodeListings)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, shouldUpdateCache, shouldUpdateCache)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getLastCacheLoadTimeUTC, getLastCacheLoadTimeUTC)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, authorizeDevice, authorizeDevice)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, doPurchaseSavedbilling, doPurchaseSavedbilling)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getMyStreamingVideos, getMyStreamingVideos)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTitleListingsPurchasedForPasses, getTitleListingsPurchasedForPasses)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTitleListingPurchasedForPass, getTitleListingPurchasedForPass)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, checkRentalExpiration, checkRentalExpiration)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, checkForPurchasedStreamByTitleID, checkForPurchasedStreamByTitleID)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, checkForPurchasedStream, checkForPurchasedStream)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getBillingInfo, getBillingInfo)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, showPrePaidCardBalance, showPrePaidCardBalance)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getBillingInfoAndPPCBalance, getBillingInfoAndPPCBalance)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getEmailAddress, getEmailAddress)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getSettingsPageInfo, getSettingsPageInfo)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, assignGiftCertificateToUser, assignGiftCertificateToUser)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, manageStreamInstanceStatus, manageStreamInstanceStatus)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getStreamingAssetLocation, getStreamingAssetLocation)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getBonusAssetLocation, getBonusAssetLocation)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, loadLastStreamingAssetLocationForPass, loadLastStreamingAssetLocationForPass)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getWishlistItems, getWishlistItems)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, removeItemFromWishList, removeItemFromWishList)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, removeAllItemsFromWishList, removeAllItemsFromWishList)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, addItemToWishlist, addItemToWishlist)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, checkAdultVerificationEnabled, checkAdultVerificationEnabled)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, checkAdultVerificationPin, checkAdultVerificationPin)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getConfig, getConfig)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, deactivateDevice, deactivateDevice)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, removeAllMyPurchases, removeAllMyPurchases)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, checkAuthToken, checkAuthToken)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, ReturnError, ReturnError)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, ReturnTimeout, ReturnTimeout)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, calcOrderTax, calcOrderTax)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, GetCountryID, GetCountryID)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getAudioDefaultProperty, getAudioDefaultProperty)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, setAudioDefaultProperty, setAudioDefaultProperty)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTHXMediaDirector, getTHXMediaDirector)
+VL_SOAP_OPERATION(StreamAPISoap12Proxy, getTHXMediaDirectorBonusAsset, getTHXMediaDirectorBonusAsset)

@@ -1,0 +1,44 @@
+// VLSoapTransport: how every SOAP context of the library reaches the network. Installed once on
+// a context (as a gSOAP plug-in) it replaces the context's connection callbacks:
+//
+// - open: TCP to the URL's host and port, or to the HTTP proxy when one is set, after the lab
+//   override VLWS_CONNECT_TO (VLConnectTo); connect time-out = the context's connect_timeout.
+//   For "https" URLs then a CONNECT tunnel through the proxy, and TLS with the context's TLS
+//   context: SNI and the certificate check use the URL's host, never the overridden address.
+//   The handshake is bounded by connect_timeout as well.
+// - TLS writes go through a socket BIO that sends with MSG_NOSIGNAL, so a peer that hangs up
+//   gives an error result and never a SIGPIPE (plain sockets get the same flag through the
+//   context's socket_flags, set by the service objects).
+// - receive over TLS: one wait of at most recv_timeout for data, however the TLS records are cut.
+// - close: a TLS connection sends its close_notify and is closed at once. (gSOAP's own close
+//   then waits up to 5 s for the peer's close_notify, which put 5 s on every failed call and
+//   made a 5 s receive time-out take twice as long.)
+// - HTTP headers: "User-Agent" is the configured text or "gSOAP/2.7"; "Accept-Encoding" is
+//   "gzip, deflate".
+// - every block of bytes sent or received is logged raw to "soap_sent" / "soap_recv" (level 4);
+//   connection traces go to "soap_test".
+//
+// Any request made on the context (SOAP calls and plain HTTP requests over soap_connect_command,
+// fsend and frecv) takes this path.
+#ifndef VLSOAPTRANSPORT_H
+#define VLSOAPTRANSPORT_H
+
+#include <openssl/bio.h>
+
+#include "stdsoap2.h"
+
+class VLSoapTransport {
+ public:
+  // Installs the transport on a context. Returns SOAP_OK or the registration's error.
+  static int Install(soap* soap);
+
+  // The User-Agent of the context's requests: userAgent when not empty, else "gSOAP/2.7". The
+  // text is referenced, not copied. Requires Install.
+  static void SetUserAgent(soap* soap, const char* userAgent);
+
+  // A BIO over the connected socket fd (not closed with the BIO) that writes with
+  // send(MSG_NOSIGNAL) and otherwise behaves as OpenSSL's socket BIO. Null when out of memory.
+  static BIO* NewSocketBIO(int fd);
+};
+
+#endif  // VLSOAPTRANSPORT_H

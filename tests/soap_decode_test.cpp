@@ -1,0 +1,197 @@
+// Reading replies: records decoded from canned answers of a loopback server, faults, HTTP
+// statuses, compressed replies and the proxy's log lines.
+#include <gtest/gtest.h>
+
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include "RealTimeBrowse.h"
+#include "StreamAPI.h"
+#include "VLTestServer.h"
+#include "VLWSAELog.h"
+#include "VL_Log.h"
+
+namespace {
+
+// Catches the messages of the "soap_proxy" and "soap_test" areas.
+class LogCapture {
+ public:
+  LogCapture() {
+    int id;
+    for (const char* area : {"soap_proxy", "soap_test"}) {
+      VL_LogRegisterArea(area, &id);
+      VL_LogActivateArea(id, 1);
+    }
+    VL_LogSetObserver(Observe, this);
+  }
+  ~LogCapture() { VL_LogSetObserver(nullptr, nullptr); }
+  bool Has(const std::string& area, const std::string& text) {
+    std::lock_guard<std::mutex> lock(m_Mutex);
+    for (const auto& m : m_Messages)
+      if (m.first == area && m.second.find(text) != std::string::npos) return true;
+    return false;
+  }
+
+ private:
+  static void Observe(void* ctx, const char* area, int, const char* text, size_t len) {
+    LogCapture* self = static_cast<LogCapture*>(ctx);
+    std::lock_guard<std::mutex> lock(self->m_Mutex);
+    self->m_Messages.emplace_back(area, std::string(text, len));
+  }
+  std::mutex m_Mutex;
+  std::vector<std::pair<std::string, std::string>> m_Messages;
+};
+
+// A catalogue service object talking plain HTTP to a loopback server.
+class SoapDecode : public ::testing::Test {
+ protected:
+  SoapDecode() {
+    VLTestFillParams(&m_Params, "http://127.0.0.1:" + std::to_string(m_Server.Port()) + "/api/");
+    m_Rtb.SetParams(&m_Params);
+  }
+  ~SoapDecode() override {
+    soap_destroy(&m_Rtb);
+    soap_end(&m_Rtb);
+  }
+
+  // getTitlesByNavigation answered with the given result element content.
+  int GetTitles(const std::string& responseContent, _VL1__getTitlesByNavigationResponse** response) {
+    m_Server.SetReply(VLTestServer::HttpReply(VLTestServer::Envelope(
+        "<VL1:getTitlesByNavigationResponse>" + responseContent + "</VL1:getTitlesByNavigationResponse>")));
+    EXPECT_EQ(SOAP_OK, m_Rtb.Setup("getTitlesByNavigation"));
+    *response = soap_new__VL1__getTitlesByNavigationResponse(&m_Rtb);
+    return m_Rtb.getTitlesByNavigation(soap_new__VL1__getTitlesByNavigation(&m_Rtb), *response);
+  }
+
+  VLTestServer m_Server;
+  VL_WS_SetupParams2 m_Params;
+  RealTimeBrowse m_Rtb;
+};
+
+std::string Listing(const std::string& inner) { return "<VL1:TitleListing>" + inner + "</VL1:TitleListing>"; }
+
+}  // namespace
+
+TEST_F(SoapDecode, TitleListingToleratesUnknownAndMissingElements) {
+  LogCapture log;
+  _VL1__getTitlesByNavigationResponse* r;
+  ASSERT_EQ(SOAP_OK, GetTitles("<VL1:getTitlesByNavigationResult><VL1:ResponseCode>0</VL1:ResponseCode>"
+                               "<VL1:ResponseMessage>OK</VL1:ResponseMessage><VL1:TotalItems>1</VL1:TotalItems>"
+                               "<VL1:Titles>" +
+                                   Listing("<VL1:TitleName>Heat</VL1:TitleName><VL1:Surprise><x>1</x></VL1:Surprise>"
+                                           "<VL1:TitleID>42</VL1:TitleID><VL1:IsTvListing>true</VL1:IsTvListing>"
+                                           "<VL1:AvailableProducts><VL1:ProductListing><VL1:Price>9.99</VL1:Price>"
+                                           "<VL1:PurchaseType>any</VL1:PurchaseType></VL1:ProductListing>"
+                                           "</VL1:AvailableProducts>") +
+                                   "</VL1:Titles></VL1:getTitlesByNavigationResult>",
+                               &r));
+  VL1__GetTitlesResponse* result = r->getTitlesByNavigationResult;
+  ASSERT_NE(nullptr, result);
+  EXPECT_STREQ("OK", result->ResponseMessage);
+  EXPECT_EQ(1, result->TotalItems);
+  ASSERT_NE(nullptr, result->Titles);
+  ASSERT_EQ(1, result->Titles->__sizeTitleListing);
+  VL1__TitleListing* t = result->Titles->TitleListing[0];
+  EXPECT_EQ(42, t->TitleID);
+  EXPECT_STREQ("Heat", t->TitleName);
+  EXPECT_EQ(0, t->TitlePosition);
+  EXPECT_EQ(nullptr, t->BoxArtPrefix);
+  EXPECT_EQ(true_, t->IsTvListing);
+  ASSERT_EQ(1, t->AvailableProducts->__sizeProductListing);
+  EXPECT_STREQ("9.99", t->AvailableProducts->ProductListing[0]->Price);
+  EXPECT_EQ(VL1__StreamAPIPurchaseType__any, t->AvailableProducts->ProductListing[0]->PurchaseType);
+  EXPECT_TRUE(log.Has("soap_proxy", "Entering RealTimeBrowseSoap12Proxy::getTitlesByNavigation"));
+  EXPECT_TRUE(log.Has("soap_proxy", "Exiting RealTimeBrowseSoap12Proxy::getTitlesByNavigation"));
+}
+
+TEST_F(SoapDecode, EnumerationsByNameOrNumberAndUnknownNameIsTypeError) {
+  auto assets = [](const std::string& items) {
+    return "<VL1:getTitlesByNavigationResult><VL1:Titles>" +
+           Listing("<VL1:AvailableProducts><VL1:ProductListing><VL1:AvailableAssets>" + items +
+                   "</VL1:AvailableAssets></VL1:ProductListing></VL1:AvailableProducts>") +
+           "</VL1:Titles></VL1:getTitlesByNavigationResult>";
+  };
+  _VL1__getTitlesByNavigationResponse* r;
+  ASSERT_EQ(SOAP_OK, GetTitles(assets("<VL1:FileProfile>HIGH_DEFINITION</VL1:FileProfile><VL1:FileProfile>7</VL1:FileProfile>"), &r));
+  VL1__ArrayOfFileProfile* profiles = r->getTitlesByNavigationResult->Titles->TitleListing[0]->AvailableProducts->ProductListing[0]->AvailableAssets;
+  ASSERT_EQ(2, profiles->__sizeFileProfile);
+  EXPECT_EQ(2, profiles->FileProfile[0]);
+  EXPECT_EQ(7, profiles->FileProfile[1]);
+  soap_destroy(&m_Rtb);
+  soap_end(&m_Rtb);
+  EXPECT_EQ(SOAP_TYPE, GetTitles(assets("<VL1:FileProfile>HD</VL1:FileProfile>"), &r));
+}
+
+TEST_F(SoapDecode, EmptyArrayMissingArrayAndMissingResult) {
+  _VL1__getTitlesByNavigationResponse* r;
+  ASSERT_EQ(SOAP_OK, GetTitles("<VL1:getTitlesByNavigationResult><VL1:Titles/></VL1:getTitlesByNavigationResult>", &r));
+  ASSERT_NE(nullptr, r->getTitlesByNavigationResult->Titles);
+  EXPECT_EQ(0, r->getTitlesByNavigationResult->Titles->__sizeTitleListing);
+  soap_destroy(&m_Rtb);
+  soap_end(&m_Rtb);
+  ASSERT_EQ(SOAP_OK, GetTitles("<VL1:getTitlesByNavigationResult><VL1:GenreID>3</VL1:GenreID></VL1:getTitlesByNavigationResult>", &r));
+  EXPECT_EQ(3, r->getTitlesByNavigationResult->GenreID);
+  EXPECT_EQ(nullptr, r->getTitlesByNavigationResult->Titles);
+  soap_destroy(&m_Rtb);
+  soap_end(&m_Rtb);
+  ASSERT_EQ(SOAP_OK, GetTitles("", &r));
+  EXPECT_EQ(nullptr, r->getTitlesByNavigationResult);
+}
+
+TEST_F(SoapDecode, GzipReplyIsInflated) {
+  std::string envelope = VLTestServer::Envelope(
+      "<VL1:getGenreLabelResponse><VL1:getGenreLabelResult><VL1:Label>Drama</VL1:Label>"
+      "</VL1:getGenreLabelResult></VL1:getGenreLabelResponse>");
+  m_Server.SetReply(VLTestServer::HttpReply(VLTestServer::Gzip(envelope), "200 OK", "Content-Encoding: gzip\r\n"));
+  ASSERT_EQ(SOAP_OK, m_Rtb.Setup("getGenreLabel"));
+  _VL1__getGenreLabelResponse* r = soap_new__VL1__getGenreLabelResponse(&m_Rtb);
+  ASSERT_EQ(SOAP_OK, m_Rtb.getGenreLabel(soap_new__VL1__getGenreLabel(&m_Rtb), r));
+  ASSERT_NE(nullptr, r->getGenreLabelResult);
+  EXPECT_STREQ("Drama", r->getGenreLabelResult->Label);
+}
+
+TEST_F(SoapDecode, FaultsAndHttpStatuses) {
+  LogCapture log;
+  struct Case {
+    std::string reply;
+    int code;
+  } cases[] = {
+      {VLTestServer::HttpReply(VLTestServer::Envelope("<SOAP-ENV:Fault><faultcode>SOAP-ENV:Server</faultcode>"
+                                                      "<faultstring>Store is down</faultstring></SOAP-ENV:Fault>"),
+                               "500 Internal Server Error"),
+       SOAP_SVR_FAULT},
+      {VLTestServer::HttpReply(VLTestServer::Envelope("<SOAP-ENV:Fault><faultcode>VL1:Throttled</faultcode>"
+                                                      "<faultstring>Store is down</faultstring></SOAP-ENV:Fault>"),
+                               "500 Internal Server Error"),
+       SOAP_FAULT},
+      {VLTestServer::HttpReply("<html>gone</html>", "404 Not Found"), 404},
+  };
+  for (const Case& c : cases) {
+    m_Server.SetReply(c.reply);
+    ASSERT_EQ(SOAP_OK, m_Rtb.Setup("getFileType"));
+    EXPECT_EQ(c.code, m_Rtb.getFileType(soap_new__VL1__getFileType(&m_Rtb), soap_new__VL1__getFileTypeResponse(&m_Rtb)));
+    if (c.code != 404) EXPECT_STREQ("Store is down", m_Rtb.soap_fault_string());
+    soap_destroy(&m_Rtb);
+    soap_end(&m_Rtb);
+  }
+  EXPECT_TRUE(log.Has("soap_test", "HTTP error 404"));
+}
+
+TEST_F(SoapDecode, UntypedElementKeptAsLiteralXml) {
+  StreamAPI st;
+  st.SetParams(&m_Params);
+  m_Server.SetReply(VLTestServer::HttpReply(VLTestServer::Envelope(
+      "<VL1:authorizeDeviceResponse><VL1:authorizeDeviceResult><VL1:ResponseCode>0</VL1:ResponseCode>"
+      "<VL1:AuthToken>T0K</VL1:AuthToken><VL1:IsAdultVerificationEnabled>true</VL1:IsAdultVerificationEnabled>"
+      "</VL1:authorizeDeviceResult></VL1:authorizeDeviceResponse>")));
+  ASSERT_EQ(SOAP_OK, st.Setup("authorizeDevice"));
+  _VL1__authorizeDeviceResponse* r = soap_new__VL1__authorizeDeviceResponse(&st);
+  ASSERT_EQ(SOAP_OK, st.authorizeDevice(soap_new__VL1__authorizeDevice(&st), r));
+  ASSERT_NE(nullptr, r->authorizeDeviceResult);
+  EXPECT_STREQ("T0K", r->authorizeDeviceResult->AuthToken);
+  EXPECT_STREQ("true", r->authorizeDeviceResult->IsAdultVerificationEnabled);
+  EXPECT_EQ(nullptr, r->authorizeDeviceResult->DeviceID);
+  soap_destroy(&st);
+  soap_end(&st);
+}

@@ -1,0 +1,278 @@
+#include "VLTestServer.h"
+
+#include <arpa/inet.h>
+#include <netinet/in.h>
+#include <poll.h>
+#include <stdlib.h>
+#include <string.h>
+#include <strings.h>
+#include <sys/socket.h>
+#include <unistd.h>
+#include <zlib.h>
+
+#include <chrono>
+
+#include <openssl/err.h>
+#include <openssl/pem.h>
+#include <openssl/ssl.h>
+#include <openssl/x509v3.h>
+
+#include "VLSoapTransport.h"
+#include "VLStoreHosts.h"
+
+namespace {
+
+EVP_PKEY* NewKey() { return EVP_EC_gen("P-256"); }
+
+void AddExt(X509* cert, X509* issuer, int nid, const char* value) {
+  X509V3_CTX ctx;
+  X509V3_set_ctx_nodb(&ctx);
+  X509V3_set_ctx(&ctx, issuer, cert, NULL, NULL, 0);
+  X509_EXTENSION* ext = X509V3_EXT_conf_nid(NULL, &ctx, nid, value);
+  X509_add_ext(cert, ext, -1);
+  X509_EXTENSION_free(ext);
+}
+
+// A certificate for key with common name cn, signed by issuer (itself when null).
+VLTestPKI::Cert MakeCert(const char* cn, const char* san, bool ca, const VLTestPKI::Cert* issuer) {
+  static long serial = 1;
+  VLTestPKI::Cert c = {X509_new(), NewKey()};
+  X509_set_version(c.cert, 2);
+  ASN1_INTEGER_set(X509_get_serialNumber(c.cert), serial++);
+  X509_gmtime_adj(X509_getm_notBefore(c.cert), -3600);
+  X509_gmtime_adj(X509_getm_notAfter(c.cert), 86400);
+  X509_set_pubkey(c.cert, c.key);
+  X509_NAME* name = X509_get_subject_name(c.cert);
+  X509_NAME_add_entry_by_txt(name, "O", MBSTRING_ASC, reinterpret_cast<const unsigned char*>("VL Test"), -1, -1, 0);
+  X509_NAME_add_entry_by_txt(name, "CN", MBSTRING_ASC, reinterpret_cast<const unsigned char*>(cn), -1, -1, 0);
+  X509* issuerCert = issuer ? issuer->cert : c.cert;
+  X509_set_issuer_name(c.cert, X509_get_subject_name(issuerCert));
+  AddExt(c.cert, issuerCert, NID_basic_constraints, ca ? "critical,CA:TRUE" : "CA:FALSE");
+  AddExt(c.cert, issuerCert, NID_key_usage, ca ? "critical,keyCertSign,cRLSign" : "critical,digitalSignature");
+  AddExt(c.cert, issuerCert, NID_subject_key_identifier, "hash");
+  if (san) AddExt(c.cert, issuerCert, NID_subject_alt_name, san);
+  X509_sign(c.cert, issuer ? issuer->key : c.key, EVP_sha256());
+  return c;
+}
+
+const char kServerNames[] = "DNS:localhost,IP:127.0.0.1,DNS:" VL_STORE_PRODUCTION_HOST;
+
+}  // namespace
+
+VLTestPKI::VLTestPKI() {
+  m_CA = MakeCert("VL Test Root CA", NULL, true, NULL);
+  m_Trusted = MakeCert("VL Loopback Test Server", kServerNames, false, &m_CA);
+  m_SelfSigned = MakeCert("VL Self-signed Test Server", kServerNames, false, NULL);
+  m_OtherHost = MakeCert("VL Other Test Server", "DNS:other.ostrel.example", false, &m_CA);
+  char path[] = "/tmp/vl-test-ca-XXXXXX";
+  int fd = mkstemp(path);
+  FILE* f = fdopen(fd, "w");
+  PEM_write_X509(f, m_CA.cert);
+  fclose(f);
+  m_CAFile = path;
+  setenv("SSL_CERT_FILE", path, 1);
+}
+
+VLTestPKI& VLTestPKI::Get() {
+  // Never destroyed: the CA file is removed at exit, the objects live as long as the process.
+  static VLTestPKI* s_PKI = [] {
+    VLTestPKI* pki = new VLTestPKI();
+    static std::string s_File = pki->m_CAFile;
+    atexit([] { unlink(s_File.c_str()); });
+    return pki;
+  }();
+  return *s_PKI;
+}
+
+VLTestServer::VLTestServer(const VLTestPKI::Cert* cert) : m_Ctx(nullptr), m_Stop(false), m_Behaviour(kReply) {
+  m_Listen = socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
+  sockaddr_in addr;
+  memset(&addr, 0, sizeof(addr));
+  addr.sin_family = AF_INET;
+  addr.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+  bind(m_Listen, reinterpret_cast<sockaddr*>(&addr), sizeof(addr));
+  listen(m_Listen, 16);
+  socklen_t len = sizeof(addr);
+  getsockname(m_Listen, reinterpret_cast<sockaddr*>(&addr), &len);
+  m_Port = ntohs(addr.sin_port);
+  if (cert) {
+    SSL_CTX* ctx = SSL_CTX_new(TLS_server_method());
+    SSL_CTX_use_certificate(ctx, cert->cert);
+    SSL_CTX_use_PrivateKey(ctx, cert->key);
+    m_Ctx = ctx;
+  }
+  m_Thread = std::thread([this] { Serve(); });
+}
+
+VLTestServer::~VLTestServer() {
+  m_Stop = true;
+  m_Thread.join();
+  close(m_Listen);
+  SSL_CTX_free(static_cast<SSL_CTX*>(m_Ctx));
+}
+
+void VLTestServer::SetReply(const std::string& reply) {
+  std::lock_guard<std::mutex> lock(m_Mutex);
+  m_Reply = reply;
+}
+
+void VLTestServer::SetBehaviour(Behaviour b) {
+  std::lock_guard<std::mutex> lock(m_Mutex);
+  m_Behaviour = b;
+}
+
+std::vector<std::string> VLTestServer::Requests() {
+  std::lock_guard<std::mutex> lock(m_Mutex);
+  return m_Requests;
+}
+
+bool VLTestServer::WaitFor(size_t n) {
+  std::unique_lock<std::mutex> lock(m_Mutex);
+  return m_Cond.wait_for(lock, std::chrono::seconds(5), [&] { return m_Requests.size() >= n; });
+}
+
+void VLTestServer::Serve() {
+  while (!m_Stop) {
+    pollfd p = {m_Listen, POLLIN, 0};
+    if (poll(&p, 1, 50) <= 0) continue;
+    int fd = accept4(m_Listen, NULL, NULL, SOCK_CLOEXEC);
+    if (fd < 0) continue;
+    timeval tv = {5, 0};
+    setsockopt(fd, SOL_SOCKET, SO_RCVTIMEO, &tv, sizeof(tv));
+    setsockopt(fd, SOL_SOCKET, SO_SNDTIMEO, &tv, sizeof(tv));
+    Handle(fd);
+    close(fd);
+  }
+}
+
+void VLTestServer::Handle(int fd) {
+  Behaviour behaviour;
+  std::string reply;
+  {
+    std::lock_guard<std::mutex> lock(m_Mutex);
+    behaviour = m_Behaviour;
+    reply = m_Reply;
+  }
+  SSL* ssl = nullptr;
+  if (m_Ctx) {
+    ssl = SSL_new(static_cast<SSL_CTX*>(m_Ctx));
+    BIO* bio = VLSoapTransport::NewSocketBIO(fd);
+    SSL_set_bio(ssl, bio, bio);
+    if (SSL_accept(ssl) != 1) {  // the client refused the certificate
+      SSL_free(ssl);
+      ERR_clear_error();
+      return;
+    }
+  }
+  auto readSome = [&](char* buf, int n) { return ssl ? SSL_read(ssl, buf, n) : static_cast<int>(recv(fd, buf, n, 0)); };
+  if (behaviour == kCloseAtOnce) {
+    linger l = {1, 0};  // reset: the client's next write fails at once
+    setsockopt(fd, SOL_SOCKET, SO_LINGER, &l, sizeof(l));
+    SSL_free(ssl);
+    std::lock_guard<std::mutex> lock(m_Mutex);
+    m_Requests.push_back("");
+    m_Cond.notify_all();
+    return;
+  }
+  std::string request;
+  size_t need = std::string::npos;
+  char buf[16384];
+  while (request.size() < need) {
+    int r = readSome(buf, sizeof(buf));
+    if (r <= 0) break;
+    request.append(buf, r);
+    size_t end = request.find("\r\n\r\n");
+    if (end != std::string::npos && need == std::string::npos) {
+      std::string length = Header(request, "Content-Length");
+      need = end + 4 + (length.empty() ? 0 : strtoul(length.c_str(), NULL, 10));
+    }
+  }
+  {
+    std::lock_guard<std::mutex> lock(m_Mutex);
+    m_Requests.push_back(request);
+    m_Cond.notify_all();
+  }
+  if (behaviour == kHang) {
+    while (!m_Stop) {
+      pollfd p = {fd, POLLIN, 0};
+      if (poll(&p, 1, 50) > 0 && readSome(buf, sizeof(buf)) <= 0) break;
+    }
+  } else if (ssl) {
+    SSL_write(ssl, reply.data(), static_cast<int>(reply.size()));
+    SSL_shutdown(ssl);
+  } else {
+    send(fd, reply.data(), reply.size(), MSG_NOSIGNAL);
+  }
+  SSL_free(ssl);
+  ERR_clear_error();
+}
+
+std::string VLTestServer::Head(const std::string& request) {
+  size_t end = request.find("\r\n\r\n");
+  return end == std::string::npos ? request : request.substr(0, end + 4);
+}
+
+std::string VLTestServer::Body(const std::string& request) {
+  size_t end = request.find("\r\n\r\n");
+  return end == std::string::npos ? "" : request.substr(end + 4);
+}
+
+static size_t FindHeader(const std::string& head, const std::string& name, size_t from) {
+  for (size_t p = head.find("\r\n", from); p != std::string::npos; p = head.find("\r\n", p + 2)) {
+    if (strncasecmp(head.c_str() + p + 2, (name + ":").c_str(), name.size() + 1) == 0) return p + 2;
+  }
+  return std::string::npos;
+}
+
+std::string VLTestServer::Header(const std::string& request, const std::string& name) {
+  std::string head = Head(request);
+  size_t p = FindHeader(head, name, 0);
+  if (p == std::string::npos) return "";
+  size_t start = head.find_first_not_of(' ', p + name.size() + 1);
+  return head.substr(start, head.find("\r\n", start) - start);
+}
+
+int VLTestServer::HeaderCount(const std::string& request, const std::string& name) {
+  std::string head = Head(request);
+  int n = 0;
+  for (size_t p = FindHeader(head, name, 0); p != std::string::npos; p = FindHeader(head, name, p)) n++;
+  return n;
+}
+
+std::string VLTestServer::HttpReply(const std::string& body, const std::string& status, const std::string& extraHeaders) {
+  return "HTTP/1.1 " + status + "\r\nContent-Type: text/xml; charset=utf-8\r\nContent-Length: " +
+         std::to_string(body.size()) + "\r\n" + extraHeaders + "Connection: close\r\n\r\n" + body;
+}
+
+std::string VLTestServer::Envelope(const std::string& bodyContent) {
+  return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
+         "<SOAP-ENV:Envelope xmlns:SOAP-ENV=\"http://schemas.xmlsoap.org/soap/envelope/\" "
+         "xmlns:VL1=\"" VL_API_NAMESPACE "\"><SOAP-ENV:Body>" +
+         bodyContent + "</SOAP-ENV:Body></SOAP-ENV:Envelope>";
+}
+
+std::string VLTestServer::Gzip(const std::string& text) {
+  z_stream z;
+  memset(&z, 0, sizeof(z));
+  deflateInit2(&z, Z_DEFAULT_COMPRESSION, Z_DEFLATED, 16 + MAX_WBITS, 8, Z_DEFAULT_STRATEGY);
+  std::string out(deflateBound(&z, text.size()) + 32, '\0');
+  z.next_in = reinterpret_cast<Bytef*>(const_cast<char*>(text.data()));
+  z.avail_in = static_cast<uInt>(text.size());
+  z.next_out = reinterpret_cast<Bytef*>(&out[0]);
+  z.avail_out = static_cast<uInt>(out.size());
+  deflate(&z, Z_FINISH);
+  out.resize(z.total_out);
+  deflateEnd(&z);
+  return out;
+}
+
+void VLTestFillParams(VL_WS_SetupParams2* params, const std::string& serviceBaseURL) {
+  params->APIKey = "key";
+  params->DestinationUniqueID = "00-11-22-33-44-55";
+  params->DestinationTypeID = 7;
+  params->UserName = "user";
+  params->Password = "secret";
+  params->ServiceBaseURL = serviceBaseURL.c_str();
+  params->SendTimeout = 5;
+  params->RecvTimeout = 5;
+}
