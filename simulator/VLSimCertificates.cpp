@@ -1,5 +1,6 @@
 #include "VLSimCertificates.h"
 
+#include <arpa/inet.h>
 #include <openssl/bn.h>
 #include <openssl/err.h>
 #include <openssl/pem.h>
@@ -72,9 +73,12 @@ VLSimCertificates::Cert MakeCert(const CertSpec& spec, EVP_PKEY* key, X509* issu
 
 }  // namespace
 
-bool VLSimCertificates::Create(const std::vector<std::string>& hosts, std::string* error) {
+bool VLSimCertificates::Create(const std::vector<std::string>& names, std::string* error) {
   std::string altNames;
-  for (const std::string& host : hosts) altNames += (altNames.empty() ? "DNS:" : ",DNS:") + host;
+  for (const std::string& name : names) {
+    struct in_addr address;
+    altNames += std::string(altNames.empty() ? "" : ",") + (inet_pton(AF_INET, name.c_str(), &address) == 1 ? "IP:" : "DNS:") + name;
+  }
 
   m_CAKey.reset(EVP_EC_gen("P-256"));
   Key serverKey(EVP_EC_gen("P-256"));

@@ -30,9 +30,9 @@ class VLSimCertificates {
   using Key = std::unique_ptr<EVP_PKEY, KeyDeleter>;
   using Cert = std::unique_ptr<X509, CertDeleter>;
 
-  // Makes the CA and the four server certificates for the given DNS names. False with a message
-  // when OpenSSL fails.
-  bool Create(const std::vector<std::string>& hosts, std::string* error);
+  // Makes the CA and the four server certificates for the given names (host names, or IPv4
+  // addresses, which become IP entries). False with a message when OpenSSL fails.
+  bool Create(const std::vector<std::string>& names, std::string* error);
 
   // Writes the CA certificate as PEM (the file a client names in SSL_CERT_FILE).
   bool WriteCA(const std::string& path, std::string* error) const;
