@@ -17,6 +17,7 @@
 
 #include "VLSimServer.h"
 #include "VLSoapTransport.h"
+#include "VLStoreHosts.h"
 
 VLTestPKI::VLTestPKI() {
   std::vector<std::string> names = {"localhost", "127.0.0.1"};
