@@ -20,6 +20,15 @@ Result* NotAuthorised(struct soap* soap, Result* result) {
   return VLSimReply(soap, result, VLSimCode::kNotAuthorised, kNotAuthorisedText);
 }
 
+// The calling account's data; without a valid token, answers kNotAuthorised in result and false.
+template <typename Result>
+bool AccountData(struct soap* soap, Result* result, VLSimAccountData* data) {
+  int account = VLSimAccountOf(soap);
+  if (account && VLSimStoreOf(soap).Account(account, data)) return true;
+  NotAuthorised(soap, result);
+  return false;
+}
+
 template <typename Item>
 Item** NewPointers(struct soap* soap, size_t count) {
   return static_cast<Item**>(soap_malloc(soap, (count + 1) * sizeof(Item*)));
@@ -161,8 +170,7 @@ int RentalExpiration(struct soap* soap, _VL1__checkRentalExpiration* request,
 VL1__BillingInfoResponse* BillingInfo(struct soap* soap) {
   VL1__BillingInfoResponse* result = soap_new_VL1__BillingInfoResponse(soap);
   VLSimAccountData data;
-  int account = VLSimAccountOf(soap);
-  if (!account || !VLSimStoreOf(soap).Account(account, &data)) return NotAuthorised(soap, result);
+  if (!AccountData(soap, result, &data)) return result;
   if (data.ccLastFour.empty()) return VLSimReply(soap, result, VLSimCode::kNoBillingInfo, "No saved billing information");
   result->CCLastFour = VLSimText(soap, data.ccLastFour);
   result->CCTypeId = data.ccTypeId;
@@ -173,8 +181,7 @@ VL1__BillingInfoResponse* BillingInfo(struct soap* soap) {
 VL1__PPCardBalanceResponse* PrepaidBalance(struct soap* soap) {
   VL1__PPCardBalanceResponse* result = soap_new_VL1__PPCardBalanceResponse(soap);
   VLSimAccountData data;
-  int account = VLSimAccountOf(soap);
-  if (!account || !VLSimStoreOf(soap).Account(account, &data)) return NotAuthorised(soap, result);
+  if (!AccountData(soap, result, &data)) return result;
   result->Balance = data.prepaidCents;
   return VLSimReply(soap, result, 0);
 }
@@ -194,11 +201,7 @@ int GetEmailAddress(struct soap* soap, _VL1__getEmailAddress*, _VL1__getEmailAdd
   VL1__GetEmailAddressResponse* result = soap_new_VL1__GetEmailAddressResponse(soap);
   response.getEmailAddressResult = result;
   VLSimAccountData data;
-  int account = VLSimAccountOf(soap);
-  if (!account || !VLSimStoreOf(soap).Account(account, &data)) {
-    NotAuthorised(soap, result);
-    return SOAP_OK;
-  }
+  if (!AccountData(soap, result, &data)) return SOAP_OK;
   result->EmailAddress = VLSimText(soap, data.email);
   VLSimReply(soap, result, 0);
   return SOAP_OK;
@@ -209,11 +212,7 @@ int GetSettingsPageInfo(struct soap* soap, _VL1__getSettingsPageInfo*, _VL1__get
   VL1__SettingsPageInfo* result = soap_new_VL1__SettingsPageInfo(soap);
   response.getSettingsPageInfoResult = result;
   VLSimAccountData data;
-  int account = VLSimAccountOf(soap);
-  if (!account || !VLSimStoreOf(soap).Account(account, &data)) {
-    NotAuthorised(soap, result);
-    return SOAP_OK;
-  }
+  if (!AccountData(soap, result, &data)) return SOAP_OK;
   result->Account = VLSimText(soap, data.email);
   result->DeviceID = VLSimText(soap, call.deviceId);
   result->DeviceName = VLSimText(soap, VLSimStoreOf(soap).DeviceName(call.token));
@@ -308,11 +307,7 @@ int CheckAdultVerificationEnabled(struct soap* soap, _VL1__checkAdultVerificatio
   VL1__CheckAdultVerificationEnabledResponse* result = soap_new_VL1__CheckAdultVerificationEnabledResponse(soap);
   response.checkAdultVerificationEnabledResult = result;
   VLSimAccountData data;
-  int account = VLSimAccountOf(soap);
-  if (!account || !VLSimStoreOf(soap).Account(account, &data)) {
-    NotAuthorised(soap, result);
-    return SOAP_OK;
-  }
+  if (!AccountData(soap, result, &data)) return SOAP_OK;
   result->IsAdultVerificationEnabled = BoolText(soap, data.adultVerification);
   VLSimReply(soap, result, 0);
   return SOAP_OK;
@@ -323,11 +318,7 @@ int CheckAdultVerificationPin(struct soap* soap, _VL1__checkAdultVerificationPin
   VL1__CheckAdultVerificationPinResponse* result = soap_new_VL1__CheckAdultVerificationPinResponse(soap);
   response.checkAdultVerificationPinResult = result;
   VLSimAccountData data;
-  int account = VLSimAccountOf(soap);
-  if (!account || !VLSimStoreOf(soap).Account(account, &data)) {
-    NotAuthorised(soap, result);
-    return SOAP_OK;
-  }
+  if (!AccountData(soap, result, &data)) return SOAP_OK;
   result->IsPinVerified = request->Pin && data.adultPin == request->Pin ? true_ : false_;
   VLSimReply(soap, result, 0);
   return SOAP_OK;
@@ -405,13 +396,8 @@ VL1__StandardResponse* Standard(struct soap* soap, int code, const char* message
 }  // namespace
 
 // Each of these account operations is offered by both account services with the same elements.
-#define VL_SIM_ACCOUNT_OPERATION(operation, function)                                                  \
-  int StreamAPISoap12Service::operation(_VL1__##operation* request, _VL1__##operation##Response& response) {   \
-    return function(soap, request, response);                                                          \
-  }                                                                                                    \
-  int DownloadAPISoap12Service::operation(_VL1__##operation* request, _VL1__##operation##Response& response) { \
-    return function(soap, request, response);                                                          \
-  }
+#define VL_SIM_ACCOUNT_OPERATION(operation, function) \
+  VL_SIM_SHARED_OPERATION(StreamAPISoap12Service, DownloadAPISoap12Service, operation, function)
 
 VL_SIM_ACCOUNT_OPERATION(authorizeDevice, AuthorizeDevice)
 VL_SIM_ACCOUNT_OPERATION(deactivateDevice, DeactivateDevice)

@@ -39,13 +39,18 @@ VL1__GetTitlesResponse* Search(struct soap* soap, const char* query, int page, i
   return VLSimTitlesPage(soap, found, 0, page, itemsPerPage, purchaseType);
 }
 
-VL1__GetGenreLabelResponse* GenreLabel(struct soap* soap, int id) {
-  VL1__GetGenreLabelResponse* response = soap_new_VL1__GetGenreLabelResponse(soap);
-  const VLSimGenre* genre = VLSimCatalogueOf(soap).FindGenre(id);
-  if (!genre) return VLSimReply(soap, response, VLSimCode::kUnknownItem, "Unknown genre");
-  response->Label = VLSimText(soap, genre->name);
-  response->LabelMessage = VLSimText(soap, genre->labelMessage);
-  return VLSimReply(soap, response, 0);
+int GetGenreLabel(struct soap* soap, _VL1__getGenreLabel* request, _VL1__getGenreLabelResponse& response) {
+  VL1__GetGenreLabelResponse* result = soap_new_VL1__GetGenreLabelResponse(soap);
+  response.getGenreLabelResult = result;
+  const VLSimGenre* genre = VLSimCatalogueOf(soap).FindGenre(request->GenreID);
+  if (!genre) {
+    VLSimReply(soap, result, VLSimCode::kUnknownItem, "Unknown genre");
+    return SOAP_OK;
+  }
+  result->Label = VLSimText(soap, genre->name);
+  result->LabelMessage = VLSimText(soap, genre->labelMessage);
+  VLSimReply(soap, result, 0);
+  return SOAP_OK;
 }
 
 VL1__GetTitlesResponse* GenrePage(struct soap* soap, int genre, int page, int itemsPerPage, int purchaseType) {
@@ -58,33 +63,42 @@ VL1__GetTitlesResponse* GenrePage(struct soap* soap, int genre, int page, int it
   return VLSimTitlesPage(soap, catalogue.TitlesInGenre(genre), genre, page, itemsPerPage, purchaseType);
 }
 
-VL1__ArrayOfGetTitlesResponse* GenreArray(struct soap* soap, const VL1__ArrayOfInt* genres, int page, int itemsPerPage,
-                                          int purchaseType) {
+int GetTitlesByGenreArray(struct soap* soap, _VL1__getTitlesByGenreArray* request,
+                          _VL1__getTitlesByGenreArrayResponse& response) {
   VL1__ArrayOfGetTitlesResponse* result = soap_new_VL1__ArrayOfGetTitlesResponse(soap);
-  int count = genres ? genres->__sizeint : 0;
+  int count = request->GenreIDs ? request->GenreIDs->__sizeint : 0;
   result->__sizeGetTitlesResponse = count;
   result->GetTitlesResponse =
       static_cast<VL1__GetTitlesResponse**>(soap_malloc(soap, (count + 1) * sizeof(VL1__GetTitlesResponse*)));
   for (int i = 0; i < count; ++i)
-    result->GetTitlesResponse[i] = GenrePage(soap, genres->int_[i], page, itemsPerPage, purchaseType);
-  return result;
+    result->GetTitlesResponse[i] = GenrePage(soap, request->GenreIDs->int_[i], request->CurrentPageNumber,
+                                             request->ItemsPerPage, request->PurchaseType);
+  response.getTitlesByGenreArrayResult = result;
+  return SOAP_OK;
 }
 
-VL1__TitleListingResponse* TitleListing(struct soap* soap, int id) {
-  const VLSimTitle* title = VLSimCatalogueOf(soap).FindTitle(id);
-  if (!title) {
-    VL1__TitleListingResponse* response = soap_new_VL1__TitleListingResponse(soap);
-    response->TitleID = id;
-    return VLSimReply(soap, response, VLSimCode::kUnknownItem, "Unknown title");
+int GetTitleListing(struct soap* soap, _VL1__getTitleListing* request, _VL1__getTitleListingResponse& response) {
+  const VLSimTitle* title = VLSimCatalogueOf(soap).FindTitle(request->TitleID);
+  if (title) {
+    response.getTitleListingResult = VLSimTitleListingResponse(soap, *title, nullptr, VLSimAccountOf(soap));
+    return SOAP_OK;
   }
-  return VLSimTitleListingResponse(soap, *title, nullptr, VLSimAccountOf(soap));
+  response.getTitleListingResult = soap_new_VL1__TitleListingResponse(soap);
+  response.getTitleListingResult->TitleID = request->TitleID;
+  VLSimReply(soap, response.getTitleListingResult, VLSimCode::kUnknownItem, "Unknown title");
+  return SOAP_OK;
 }
 
-VL1__TvEpisodeList* EpisodeList(struct soap* soap, int id) {
+int GetTvEpisodeListByTitleID(struct soap* soap, _VL1__getTvEpisodeListByTitleID* request,
+                              _VL1__getTvEpisodeListByTitleIDResponse& answer) {
   const VLSimCatalogue& catalogue = VLSimCatalogueOf(soap);
   VL1__TvEpisodeList* response = soap_new_VL1__TvEpisodeList(soap);
-  const VLSimTitle* title = catalogue.FindTitle(id);
-  if (!title || !title->tv) return VLSimReply(soap, response, VLSimCode::kUnknownItem, "Unknown television series");
+  answer.getTvEpisodeListByTitleIDResult = response;
+  const VLSimTitle* title = catalogue.FindTitle(request->TitleID);
+  if (!title || !title->tv) {
+    VLSimReply(soap, response, VLSimCode::kUnknownItem, "Unknown television series");
+    return SOAP_OK;
+  }
   response->Episodes = soap_new_VL1__ArrayOfTvEpisode(soap);
   response->Episodes->__sizeTvEpisode = static_cast<int>(title->episodes.size());
   response->Episodes->TvEpisode =
@@ -97,23 +111,30 @@ VL1__TvEpisodeList* EpisodeList(struct soap* soap, int id) {
     item->EpisodeNumber = episode->number;
     response->Episodes->TvEpisode[i] = item;
   }
-  return VLSimReply(soap, response, 0);
+  VLSimReply(soap, response, 0);
+  return SOAP_OK;
 }
 
-VL1__TitleListingResponse* EpisodeListing(struct soap* soap, int id) {
+int GetTvEpisodeListing(struct soap* soap, _VL1__getTvEpisodeListing* request,
+                        _VL1__getTvEpisodeListingResponse& response) {
   const VLSimCatalogue& catalogue = VLSimCatalogueOf(soap);
-  const VLSimEpisode* episode = catalogue.FindEpisode(id);
-  if (!episode) {
-    VL1__TitleListingResponse* response = soap_new_VL1__TitleListingResponse(soap);
-    return VLSimReply(soap, response, VLSimCode::kUnknownItem, "Unknown episode");
+  const VLSimEpisode* episode = catalogue.FindEpisode(request->EpisodeID);
+  if (episode) {
+    response.getTvEpisodeListingResult =
+        VLSimTitleListingResponse(soap, *catalogue.FindTitle(episode->title), episode, VLSimAccountOf(soap));
+    return SOAP_OK;
   }
-  return VLSimTitleListingResponse(soap, *catalogue.FindTitle(episode->title), episode, VLSimAccountOf(soap));
+  response.getTvEpisodeListingResult = soap_new_VL1__TitleListingResponse(soap);
+  VLSimReply(soap, response.getTvEpisodeListingResult, VLSimCode::kUnknownItem, "Unknown episode");
+  return SOAP_OK;
 }
 
-VL1__ArrayOfTitleListingResponse* AllEpisodeListings(struct soap* soap, int id) {
+int GetAllTvEpisodeListings(struct soap* soap, _VL1__getAllTvEpisodeListings* request,
+                            _VL1__getAllTvEpisodeListingsResponse& response) {
   const VLSimCatalogue& catalogue = VLSimCatalogueOf(soap);
   VL1__ArrayOfTitleListingResponse* result = soap_new_VL1__ArrayOfTitleListingResponse(soap);
-  const VLSimTitle* title = catalogue.FindTitle(id);
+  response.getAllTvEpisodeListingsResult = result;
+  const VLSimTitle* title = catalogue.FindTitle(request->TitleID);
   size_t count = title ? title->episodes.size() : 0;
   int account = VLSimAccountOf(soap);
   result->__sizeTitleListingResponse = static_cast<int>(count);
@@ -122,18 +143,42 @@ VL1__ArrayOfTitleListingResponse* AllEpisodeListings(struct soap* soap, int id) 
   for (size_t i = 0; i < count; ++i)
     result->TitleListingResponse[i] =
         VLSimTitleListingResponse(soap, *title, catalogue.FindEpisode(title->episodes[i]), account);
-  return result;
+  return SOAP_OK;
 }
 
-int ShouldUpdateCache(struct soap* soap, const char* utcTime) {
-  return !utcTime || VLSimStoreOf(soap).LastCacheLoadTime() != utcTime ? 1 : 0;
+int ShouldUpdateCache(struct soap* soap, _VL1__shouldUpdateCache* request, _VL1__shouldUpdateCacheResponse& response) {
+  response.shouldUpdateCacheResult =
+      !request->UTCTime || VLSimStoreOf(soap).LastCacheLoadTime() != request->UTCTime ? 1 : 0;
+  return SOAP_OK;
 }
 
-char* LastCacheLoadTime(struct soap* soap) { return VLSimText(soap, VLSimStoreOf(soap).LastCacheLoadTime()); }
+int GetLastCacheLoadTimeUTC(struct soap* soap, _VL1__getLastCacheLoadTimeUTC*,
+                            _VL1__getLastCacheLoadTimeUTCResponse& response) {
+  response.getLastCacheLoadTimeUTCResult = VLSimText(soap, VLSimStoreOf(soap).LastCacheLoadTime());
+  return SOAP_OK;
+}
+
+int SearchForTitle(struct soap* soap, _VL1__searchForTitle* request, _VL1__searchForTitleResponse& response) {
+  response.searchForTitleResult = Search(soap, request->Query, request->CurrentPageNumber, request->ItemsPerPage,
+                                         request->PurchaseType, request->TitleType, false);
+  return SOAP_OK;
+}
 
 }  // namespace
 
-// ---- RealTimeBrowse ----
+// ---- Operations of both the browse and the streaming service ----
+
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, searchForTitle, SearchForTitle)
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, getGenreLabel, GetGenreLabel)
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, getTitlesByGenreArray, GetTitlesByGenreArray)
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, getTitleListing, GetTitleListing)
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, getTvEpisodeListByTitleID, GetTvEpisodeListByTitleID)
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, getTvEpisodeListing, GetTvEpisodeListing)
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, getAllTvEpisodeListings, GetAllTvEpisodeListings)
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, shouldUpdateCache, ShouldUpdateCache)
+VL_SIM_SHARED_OPERATION(RealTimeBrowseSoap12Service, StreamAPISoap12Service, getLastCacheLoadTimeUTC, GetLastCacheLoadTimeUTC)
+
+// ---- RealTimeBrowse only ----
 
 int RealTimeBrowseSoap12Service::getFileType(_VL1__getFileType*, _VL1__getFileTypeResponse& response) {
   VL1__FileType* type = soap_new_VL1__FileType(soap);
@@ -151,21 +196,10 @@ int RealTimeBrowseSoap12Service::getNavigation(_VL1__getNavigation*, _VL1__getNa
   return SOAP_OK;
 }
 
-int RealTimeBrowseSoap12Service::searchForTitle(_VL1__searchForTitle* request, _VL1__searchForTitleResponse& response) {
-  response.searchForTitleResult = Search(soap, request->Query, request->CurrentPageNumber, request->ItemsPerPage,
-                                         request->PurchaseType, request->TitleType, false);
-  return SOAP_OK;
-}
-
 int RealTimeBrowseSoap12Service::searchForTitleDetail(_VL1__searchForTitleDetail* request,
                                                       _VL1__searchForTitleDetailResponse& response) {
   response.searchForTitleDetailResult = Search(soap, request->Query, request->CurrentPageNumber,
                                                request->ItemsPerPage, request->PurchaseType, request->TitleType, true);
-  return SOAP_OK;
-}
-
-int RealTimeBrowseSoap12Service::getGenreLabel(_VL1__getGenreLabel* request, _VL1__getGenreLabelResponse& response) {
-  response.getGenreLabelResult = GenreLabel(soap, request->GenreID);
   return SOAP_OK;
 }
 
@@ -176,39 +210,9 @@ int RealTimeBrowseSoap12Service::getTitlesByNavigation(_VL1__getTitlesByNavigati
   return SOAP_OK;
 }
 
-int RealTimeBrowseSoap12Service::getTitlesByGenreArray(_VL1__getTitlesByGenreArray* request,
-                                                       _VL1__getTitlesByGenreArrayResponse& response) {
-  response.getTitlesByGenreArrayResult = GenreArray(soap, request->GenreIDs, request->CurrentPageNumber,
-                                                    request->ItemsPerPage, request->PurchaseType);
-  return SOAP_OK;
-}
-
-int RealTimeBrowseSoap12Service::getTitleListing(_VL1__getTitleListing* request, _VL1__getTitleListingResponse& response) {
-  response.getTitleListingResult = TitleListing(soap, request->TitleID);
-  return SOAP_OK;
-}
-
 int RealTimeBrowseSoap12Service::getTitleListingByAsset(_VL1__getTitleListingByAsset*,
                                                         _VL1__getTitleListingByAssetResponse&) {
   return NotServed(soap);
-}
-
-int RealTimeBrowseSoap12Service::getTvEpisodeListByTitleID(_VL1__getTvEpisodeListByTitleID* request,
-                                                           _VL1__getTvEpisodeListByTitleIDResponse& response) {
-  response.getTvEpisodeListByTitleIDResult = EpisodeList(soap, request->TitleID);
-  return SOAP_OK;
-}
-
-int RealTimeBrowseSoap12Service::getTvEpisodeListing(_VL1__getTvEpisodeListing* request,
-                                                     _VL1__getTvEpisodeListingResponse& response) {
-  response.getTvEpisodeListingResult = EpisodeListing(soap, request->EpisodeID);
-  return SOAP_OK;
-}
-
-int RealTimeBrowseSoap12Service::getAllTvEpisodeListings(_VL1__getAllTvEpisodeListings* request,
-                                                         _VL1__getAllTvEpisodeListingsResponse& response) {
-  response.getAllTvEpisodeListingsResult = AllEpisodeListings(soap, request->TitleID);
-  return SOAP_OK;
 }
 
 int RealTimeBrowseSoap12Service::translateTivoExternalId(_VL1__translateTivoExternalId* request,
@@ -228,18 +232,6 @@ int RealTimeBrowseSoap12Service::translateSkuId(_VL1__translateSkuId* request, _
   if (product) result->TitleId = product->title;
   response.translateSkuIdResult =
       VLSimReply(soap, result, product ? 0 : VLSimCode::kUnknownItem, product ? "" : "Unknown SKU");
-  return SOAP_OK;
-}
-
-int RealTimeBrowseSoap12Service::shouldUpdateCache(_VL1__shouldUpdateCache* request,
-                                                   _VL1__shouldUpdateCacheResponse& response) {
-  response.shouldUpdateCacheResult = ShouldUpdateCache(soap, request->UTCTime);
-  return SOAP_OK;
-}
-
-int RealTimeBrowseSoap12Service::getLastCacheLoadTimeUTC(_VL1__getLastCacheLoadTimeUTC*,
-                                                         _VL1__getLastCacheLoadTimeUTCResponse& response) {
-  response.getLastCacheLoadTimeUTCResult = LastCacheLoadTime(soap);
   return SOAP_OK;
 }
 
@@ -271,7 +263,7 @@ int RealTimeBrowseSoap12Service::getRecommendedTitles_USCORESpecifyOutput(
   return NotServed(soap);
 }
 
-// ---- The same operations on StreamAPI ----
+// ---- StreamAPI's own names for browse operations ----
 
 int StreamAPISoap12Service::getStreamingNavigation(_VL1__getStreamingNavigation*,
                                                    _VL1__getStreamingNavigationResponse& response) {
@@ -279,26 +271,8 @@ int StreamAPISoap12Service::getStreamingNavigation(_VL1__getStreamingNavigation*
   return SOAP_OK;
 }
 
-int StreamAPISoap12Service::searchForTitle(_VL1__searchForTitle* request, _VL1__searchForTitleResponse& response) {
-  response.searchForTitleResult = Search(soap, request->Query, request->CurrentPageNumber, request->ItemsPerPage,
-                                         request->PurchaseType, request->TitleType, false);
-  return SOAP_OK;
-}
-
-int StreamAPISoap12Service::getGenreLabel(_VL1__getGenreLabel* request, _VL1__getGenreLabelResponse& response) {
-  response.getGenreLabelResult = GenreLabel(soap, request->GenreID);
-  return SOAP_OK;
-}
-
 int StreamAPISoap12Service::getTitlesByGenreCSV(_VL1__getTitlesByGenreCSV*, _VL1__getTitlesByGenreCSVResponse&) {
   return NotServed(soap);
-}
-
-int StreamAPISoap12Service::getTitlesByGenreArray(_VL1__getTitlesByGenreArray* request,
-                                                  _VL1__getTitlesByGenreArrayResponse& response) {
-  response.getTitlesByGenreArrayResult = GenreArray(soap, request->GenreIDs, request->CurrentPageNumber,
-                                                    request->ItemsPerPage, request->PurchaseType);
-  return SOAP_OK;
 }
 
 int StreamAPISoap12Service::getTitlesByStreamingNavigation(_VL1__getTitlesByStreamingNavigation* request,
@@ -308,36 +282,3 @@ int StreamAPISoap12Service::getTitlesByStreamingNavigation(_VL1__getTitlesByStre
   return SOAP_OK;
 }
 
-int StreamAPISoap12Service::getTitleListing(_VL1__getTitleListing* request, _VL1__getTitleListingResponse& response) {
-  response.getTitleListingResult = TitleListing(soap, request->TitleID);
-  return SOAP_OK;
-}
-
-int StreamAPISoap12Service::getTvEpisodeListByTitleID(_VL1__getTvEpisodeListByTitleID* request,
-                                                      _VL1__getTvEpisodeListByTitleIDResponse& response) {
-  response.getTvEpisodeListByTitleIDResult = EpisodeList(soap, request->TitleID);
-  return SOAP_OK;
-}
-
-int StreamAPISoap12Service::getTvEpisodeListing(_VL1__getTvEpisodeListing* request,
-                                                _VL1__getTvEpisodeListingResponse& response) {
-  response.getTvEpisodeListingResult = EpisodeListing(soap, request->EpisodeID);
-  return SOAP_OK;
-}
-
-int StreamAPISoap12Service::getAllTvEpisodeListings(_VL1__getAllTvEpisodeListings* request,
-                                                    _VL1__getAllTvEpisodeListingsResponse& response) {
-  response.getAllTvEpisodeListingsResult = AllEpisodeListings(soap, request->TitleID);
-  return SOAP_OK;
-}
-
-int StreamAPISoap12Service::shouldUpdateCache(_VL1__shouldUpdateCache* request, _VL1__shouldUpdateCacheResponse& response) {
-  response.shouldUpdateCacheResult = ShouldUpdateCache(soap, request->UTCTime);
-  return SOAP_OK;
-}
-
-int StreamAPISoap12Service::getLastCacheLoadTimeUTC(_VL1__getLastCacheLoadTimeUTC*,
-                                                    _VL1__getLastCacheLoadTimeUTCResponse& response) {
-  response.getLastCacheLoadTimeUTCResult = LastCacheLoadTime(soap);
-  return SOAP_OK;
-}

@@ -21,32 +21,19 @@ const char kPasswordDigest[] =
 
 // The generated services install soapcpp2's own namespace table whenever they dispatch; these
 // keep the project's table, so answers declare the same namespaces as the store's.
-class RealTimeBrowseService : public RealTimeBrowseSoap12Service {
- public:
-  using RealTimeBrowseSoap12Service::RealTimeBrowseSoap12Service;
-  void RealTimeBrowseSoap12Service_init(soap_mode imode, soap_mode omode) override {
-    RealTimeBrowseSoap12Service::RealTimeBrowseSoap12Service_init(imode, omode);
-    soap_set_namespaces(soap, namespaces);
-  }
-};
+#define VL_SIM_SERVICE_WITH_PROJECT_NAMESPACES(Name, Generated)          \
+  class Name : public Generated {                                        \
+   public:                                                               \
+    using Generated::Generated;                                          \
+    void Generated##_init(soap_mode imode, soap_mode omode) override {   \
+      Generated::Generated##_init(imode, omode);                         \
+      soap_set_namespaces(soap, namespaces);                             \
+    }                                                                    \
+  };
 
-class StreamService : public StreamAPISoap12Service {
- public:
-  using StreamAPISoap12Service::StreamAPISoap12Service;
-  void StreamAPISoap12Service_init(soap_mode imode, soap_mode omode) override {
-    StreamAPISoap12Service::StreamAPISoap12Service_init(imode, omode);
-    soap_set_namespaces(soap, namespaces);
-  }
-};
-
-class DownloadService : public DownloadAPISoap12Service {
- public:
-  using DownloadAPISoap12Service::DownloadAPISoap12Service;
-  void DownloadAPISoap12Service_init(soap_mode imode, soap_mode omode) override {
-    DownloadAPISoap12Service::DownloadAPISoap12Service_init(imode, omode);
-    soap_set_namespaces(soap, namespaces);
-  }
-};
+VL_SIM_SERVICE_WITH_PROJECT_NAMESPACES(RealTimeBrowseService, RealTimeBrowseSoap12Service)
+VL_SIM_SERVICE_WITH_PROJECT_NAMESPACES(StreamService, StreamAPISoap12Service)
+VL_SIM_SERVICE_WITH_PROJECT_NAMESPACES(DownloadService, DownloadAPISoap12Service)
 
 // The bytes in and out of one call, and the status the runtime chose.
 struct Exchange {

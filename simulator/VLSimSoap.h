@@ -70,4 +70,14 @@ struct VLSimPage {
 };
 VLSimPage VLSimPaging(int totalItems, int page, int itemsPerPage);
 
+// An operation that two services offer with the same request and response elements: both
+// generated methods call function(soap, request, response).
+#define VL_SIM_SHARED_OPERATION(ServiceA, ServiceB, operation, function)                             \
+  int ServiceA::operation(_VL1__##operation* request, _VL1__##operation##Response& response) {      \
+    return function(soap, request, response);                                                      \
+  }                                                                                                \
+  int ServiceB::operation(_VL1__##operation* request, _VL1__##operation##Response& response) {      \
+    return function(soap, request, response);                                                      \
+  }
+
 #endif  // VLSIMSOAP_H
