@@ -116,7 +116,11 @@ bool VLSimStopSignal::Sleep(int milliseconds) {
   return !m_Changed.wait_for(lock, std::chrono::milliseconds(milliseconds), [this] { return m_Stopped; });
 }
 
-VLSimConnection::~VLSimConnection() { Close(false); }
+VLSimConnection::~VLSimConnection() {
+  Close(false);
+  if (m_Ssl) SSL_free(m_Ssl);
+  close(m_Fd);
+}
 
 std::string VLSimConnection::ServerName() const {
   const char* name = m_Ssl ? SSL_get_servername(m_Ssl, TLSEXT_NAMETYPE_host_name) : nullptr;
@@ -124,7 +128,7 @@ std::string VLSimConnection::ServerName() const {
 }
 
 int VLSimConnection::Receive(char* buffer, int size) {
-  if (m_Fd < 0) return -1;
+  if (m_Closed) return -1;
   if (m_Ssl) return SSL_read(m_Ssl, buffer, size);
   ssize_t n;
   do n = recv(m_Fd, buffer, size, 0);
@@ -209,7 +213,7 @@ bool VLSimConnection::ReadRequest(VLSimHttpRequest* request, std::string* error)
 
 bool VLSimConnection::Write(const std::string& bytes) {
   size_t sent = 0;
-  while (sent < bytes.size() && m_Fd >= 0) {
+  while (sent < bytes.size() && !m_Closed) {
     int chunk = static_cast<int>(std::min<size_t>(bytes.size() - sent, 1 << 20));
     ssize_t n;
     if (m_Ssl) {
@@ -225,26 +229,25 @@ bool VLSimConnection::Write(const std::string& bytes) {
 }
 
 void VLSimConnection::Close(bool graceful) {
-  if (m_Fd < 0) return;
-  if (graceful) {
-    if (m_Ssl) SSL_shutdown(m_Ssl);
-    shutdown(m_Fd, SHUT_WR);
-    // Linger: a close with unread input would reset the connection and could destroy the
-    // answer in the peer's buffers before the peer has read it.
-    char buffer[4096];
-    auto deadline = std::chrono::steady_clock::now() + std::chrono::milliseconds(kLingerMilliseconds);
-    for (;;) {
-      int left = static_cast<int>(std::chrono::duration_cast<std::chrono::milliseconds>(
-                                      deadline - std::chrono::steady_clock::now()).count());
-      struct pollfd pfd = {m_Fd, POLLIN, 0};
-      if (left <= 0 || poll(&pfd, 1, left) <= 0) break;
-      if (recv(m_Fd, buffer, sizeof buffer, 0) <= 0) break;
-    }
+  if (m_Closed) return;
+  m_Closed = true;
+  if (!graceful) {
+    shutdown(m_Fd, SHUT_RDWR);
+    return;
   }
-  if (m_Ssl) SSL_free(m_Ssl);
-  m_Ssl = nullptr;
-  close(m_Fd);
-  m_Fd = -1;
+  if (m_Ssl) SSL_shutdown(m_Ssl);
+  shutdown(m_Fd, SHUT_WR);
+  // Linger: a close with unread input would reset the connection and could destroy the answer
+  // in the peer's buffers before the peer has read it.
+  char buffer[4096];
+  auto deadline = std::chrono::steady_clock::now() + std::chrono::milliseconds(kLingerMilliseconds);
+  for (;;) {
+    int left = static_cast<int>(
+        std::chrono::duration_cast<std::chrono::milliseconds>(deadline - std::chrono::steady_clock::now()).count());
+    struct pollfd pfd = {m_Fd, POLLIN, 0};
+    if (left <= 0 || poll(&pfd, 1, left) <= 0) break;
+    if (recv(m_Fd, buffer, sizeof buffer, 0) <= 0) break;
+  }
 }
 
 VLSimSent VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,

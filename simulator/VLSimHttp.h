@@ -75,9 +75,10 @@ class VLSimConnection {
   bool ReadRequest(VLSimHttpRequest* request, std::string* error);
   // Sends the whole text; false when the peer is gone.
   bool Write(const std::string& bytes);
-  // Ends the connection. A graceful close sends the TLS close_notify, shuts down the sending
-  // side and reads what the peer still sends for a moment, so the peer reads the whole answer
-  // before the socket goes; an abrupt one just closes the socket.
+  // Ends the exchange. A graceful close sends the TLS close_notify, shuts down the sending side
+  // and reads what the peer still sends for a moment, so the peer reads the whole answer before
+  // the socket goes; an abrupt one shuts the socket down at once (no close_notify). The socket
+  // itself is closed by the destructor, so its number stays taken while the owner still knows it.
   void Close(bool graceful);
 
  private:
@@ -85,6 +86,7 @@ class VLSimConnection {
 
   int m_Fd;
   SSL* m_Ssl;
+  bool m_Closed = false;
   std::string m_Pending;  // bytes received beyond the current request's head
 };
 

@@ -282,6 +282,12 @@ void VLSimServer::Impl::Serve(int fd, bool tls, int number) {
     VLSimRequest entry;
     entry.connection = number;
     entry.tls = tls;
+    // The entry goes into the log before the connection ends, so a client that has its answer
+    // finds the entry there.
+    auto record = [this, &entry] {
+      context.log.Add(entry);
+      if (context.options.printRequests) std::cout << VLSimRequestLog::Format(entry) << std::endl;
+    };
     bool ready = !tls || (ssl && SSL_accept(ssl) == 1);
     if (tls) {
       entry.serverName = connection.ServerName();
@@ -294,8 +300,7 @@ void VLSimServer::Impl::Serve(int fd, bool tls, int number) {
     bool graceful = ready;
     if (!ready) {
       entry.note = "TLS handshake failed";
-      context.log.Add(entry);
-      if (context.options.printRequests) std::cout << VLSimRequestLog::Format(entry) << std::endl;
+      record();
     } else if (connection.ReadRequest(&request, &problem) || !problem.empty()) {
       entry.host = request.Host();
       entry.method = request.method;
@@ -312,10 +317,10 @@ void VLSimServer::Impl::Serve(int fd, bool tls, int number) {
       VLSimSent sent = VLSimSendResponse(connection, response, faults, context.stop);
       entry.status = sent.status;
       graceful = !sent.abrupt;
-      context.log.Add(entry);
-      if (context.options.printRequests) std::cout << VLSimRequestLog::Format(entry) << std::endl;
+      record();
     }
     connection.Close(graceful);
+    // Forget the socket before the connection's destructor closes it and its number is reused.
     std::lock_guard<std::mutex> lock(workersMutex);
     openSockets.erase(fd);
   }
