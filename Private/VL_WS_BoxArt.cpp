@@ -1,6 +1,8 @@
 // Box art of the client: VL_WS_getBoxArtImage (a local file name or the image's URL) and
 // VL_WS_getBoxArtImageData (the image's bytes), with the cache's BoxArt rows and, for a file
 // cache, the image files beside the database.
+#include <string.h>
+
 #include "BoxArtDownloader.h"
 #include "VLFile.h"
 #include "VLRecord.h"
@@ -42,6 +44,9 @@ class BoxArtRequest {
         m_NeedUpdate(0) {
     const VL_WS_CacheParam2& cache = client->m_Params.CacheParam;
     if (client->m_Cache != 0 && (cache.CacheData & VL_WS_CacheParam::CACHE_BOXART)) m_CacheType = cache.CacheType;
+    // A prefix with a path separator would name a file outside the cache folder: such an image
+    // is never kept in a file.
+    if (m_CacheType == kFileCache && strchr(prefix, VLFile::PATH_SEPERATOR) != 0) m_CacheType = kNoCache;
     if (m_CacheType == kFileCache)
       m_FileName = VLUtilities::GetBoxArtImageFileName(cache.CachePath.c_str(), prefix, size);
   }

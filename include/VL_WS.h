@@ -153,8 +153,8 @@ VL_WS_Status VL_WS_updateLocalCache(VL_WS_Handle* handle, int dataKinds);
  * record (release it).
  *
  * With a file cache that stores box art, the image is downloaded (or revalidated) into the
- * cache folder as "<prefix><size>.jpg" and that file's name is returned. Otherwise, and when
- * the download fails, the answer is the image's URL
+ * cache folder as "<prefix><size>.jpg" and that file's name is returned (a prefix holding "/" is
+ * never made a file). Otherwise, and when the download fails, the answer is the image's URL
  * "http://<image host>/images/boxart/<folder size>/<URL-encoded prefix><size>.jpg".
  *
  * Returns VL_WS_OK, or VL_WS_E_INVALID_ARGUMENT (no client state, a null or empty prefix, a size

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "CacheInterface.h"
+#include "VLFile.h"
 #include "VLSimBoxArt.h"
 #include "VLTestDir.h"
 #include "VLTestServer.h"
@@ -168,6 +169,23 @@ TEST_F(BoxArt, WithoutAnImageTheAnswerIsItsUrlAndNothingIsLeftBehind) {
   std::string lastModified, data;
   EXPECT_FALSE(ReadRow("t1003_", VL_WS_BOXART_203, &length, &lastModified, &needUpdate, &data));
   EXPECT_EQ(m_Dir / "t1003_203.jpg", Location(VL_WS_BOXART_203, "t1003_"));
+}
+
+TEST_F(BoxArt, PrefixesWithAPathSeparatorAreNeverFiles) {
+  VLTestDir parent;
+  std::string folder = parent / "cache/";
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.CacheType = 2;
+  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+  params.CachePath = folder.c_str();
+  ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
+  m_Sim.ClearRequests();
+  EXPECT_EQ("http://images.ostrel.example/images/boxart/175/..%2Fescape_175.jpg", Location(VL_WS_BOXART_175, "../escape_"));
+  std::string bytes;
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Data(VL_WS_BOXART_175, "../escape_", &bytes));
+  EXPECT_EQ(1u, Images(1).size());
+  EXPECT_FALSE(VLFile::Exist((parent / "escape_175.jpg").c_str()));
+  EXPECT_TRUE(ImageFolderFiles(folder).empty());
 }
 
 TEST_F(BoxArt, OnlyAFileCacheMakesLocalFiles) {
