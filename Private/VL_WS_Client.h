@@ -1,6 +1,9 @@
 // VL_WS_Client.h: the client state behind a VL_WS_Handle (tag 1). One block per handle, never
 // shared: its three SOAP service objects, the dispatcher of account operations, the handle's
-// own settings and its cache.
+// own settings and its cache. Also the steps that the client operations share: tag the
+// out-record and find the client (VLClientFor), prepare a SOAP call in a service's context
+// (VLPrepareCall), end it (VLEndCall), or all of it for a plain call (VLPlainCall); each
+// operation then logs its result line and returns VLUtilities::To_VL_WS_Status of the call.
 #ifndef VL_WS_CLIENT_H
 #define VL_WS_CLIENT_H
 
