@@ -9,6 +9,8 @@
 #include "VLString.h"
 #include "VL_WS_Records.h"
 
+struct soap;
+
 // Schema records of the store's answers (generated from soap/VL.h.in).
 class VL1__ArrayOfGenre;
 class VL1__ArrayOfGetTitlesResponse;
@@ -131,8 +133,30 @@ class VLUtilities {
   // as it is (not URL-encoded), the image word and ".jpg". Asserts that both texts are given.
   static VLString GetBoxArtImageFileName(const char* path, const char* boxartprefix,
                                          VL_WS_BoxArtSize size);
+  // Where the image host serves an image: the path "/images/boxart/<folder word>/<prefix><image
+  // word>.jpg" with the prefix URL-encoded, and the absolute URL "http://<image host><path>".
+  static VLString GetBoxArtImagePath(const char* boxartprefix, VL_WS_BoxArtSize size);
+  static VLString GetBoxArtImageURL(const char* boxartprefix, VL_WS_BoxArtSize size);
+  // Gives an image record (kind 0) its own copy of data's bytes, releasing bytes it held; empty
+  // data leaves it without bytes (null, length 0).
+  static void SetImageByData(VL_WS_Image& image, const VLString& data);
+  // Gives an image record the whole content of a file. The record is emptied first (kind 0, no
+  // bytes, releasing bytes it held); false, with the record left empty, when the file cannot be
+  // opened, is empty, or cannot be read whole.
+  static bool SetImageByFile(VL_WS_Image& image, const VLString& filename);
 
   // ---- Endpoint query (VLUtilities_Endpoint.cpp) ----------------------------------------------
+
+  // The base URL of the store's services (https, ending in "/") for a content type (ADULT, or
+  // general for any other value) and an environment number. Environments 0 to 2 come from the
+  // endpoint table and set envID to that number. Any other number asks the store's
+  // device-environment service over the context's transport (its TLS context must be set up):
+  // envID becomes the digit it answered, or 2 (production) for an answer that is not
+  // "HTTP/1.1 200 OK" with "Content-Length: 1" and one digit, a failed exchange included. Returns
+  // the empty text, envID unchanged, when the service could not be connected to.
+  static const char* QueryServiceBaseURL(enum VL_WS_SetupParams::ContentType contentType, soap* context,
+                                         const char* destinationUniqueID, int destinationTypeID,
+                                         VL_WS_EnvNum envNum, VL_WS_EnvID& envID);
 };
 
 #endif  // VLUTILITIES_H
