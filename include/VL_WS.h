@@ -112,6 +112,87 @@ VL_WS_Status VL_WS_getDeviceEnv(VL_WS_Handle* handle, VL_WS_EnvID* envID);
  */
 VL_WS_Status VL_WS_getFileType(VL_WS_Handle* handle, VL_WS_FileType* fileType);
 
+/*
+ * Account operations in general
+ *
+ * Unless said otherwise, an account operation goes to the download service when the handle was
+ * made with access type DOWNLOAD and to the streaming service otherwise. It prepares its result
+ * before anything else: a record is cleared and tagged (release it whatever the status), a bool
+ * or int result is set to false or 0. It returns VL_WS_E_INVALID_ARGUMENT for a handle without
+ * client state, a null result pointer, or a required argument that is missing or empty, before
+ * any request.
+ *
+ * A failed call (no connection, TLS, HTTP or SOAP failure) returns its status (VL_WS_E_CONNECT,
+ * VL_WS_E_EOF, VL_WS_E_TLS, VL_WS_E_HTTP_STATUS(n), VL_WS_E_SOAP_FAULT(n), VL_WS_E_UNEXPECTED)
+ * and leaves the record cleared. An answer without its result leaves the record cleared with
+ * status VL_WS_OK. The store's ResponseCode and ResponseMessage are always in the record; where
+ * an operation says "the code counts", a non-zero code gives VL_WS_E_UNEXPECTED unless the
+ * operation lists its own statuses. Nothing changes in the handle or the cache unless the call
+ * succeeded with ResponseCode 0.
+ */
+
+/*
+ * VL_WS_authorizeDevice - link the device to the store account whose PIN is `pin`.
+ *
+ * On success the handle's token becomes the answer's AuthToken: every later request of this
+ * handle (not of its duplicates) carries it. Keep it and pass it as VL_WS_SetupParams::AuthToken
+ * at the next initialisation. With a cache of user data, all user data of the previous account
+ * are deleted, the wishlist flags included.
+ *
+ * The code counts: VL_WS_E_AUTHORIZE_1 (code 1: wrong PIN), VL_WS_E_AUTHORIZE_2 (code 2).
+ */
+VL_WS_Status VL_WS_authorizeDevice(VL_WS_Handle* handle, int pin, VL_WS_AuthorizeDeviceResponse* answer);
+
+/*
+ * VL_WS_deactivateDevice - unlink the device from its account.
+ *
+ * On success the handle's token becomes empty and, with a cache of user data, all user data are
+ * deleted. The code counts.
+ */
+VL_WS_Status VL_WS_deactivateDevice(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
+
+/*
+ * VL_WS_checkAuthToken - whether the store accepts the handle's token.
+ *
+ * With a cache of user data, the user data are deleted whenever the answer differs from the
+ * previous answer on this handle (a new handle starts from "not valid", so its first "valid"
+ * deletes them once). The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_checkAuthToken(VL_WS_Handle* handle, bool* valid);
+
+/*
+ * VL_WS_getConfig - the store's configuration for the device: key and value texts, in the
+ * store's order (the bandwidth probe's URL among them). The code counts.
+ */
+VL_WS_Status VL_WS_getConfig(VL_WS_Handle* handle, VL_WS_ConfigResponse* config);
+
+/*
+ * VL_WS_getCountryID - the store's number of the account's country. The status is the SOAP
+ * call's.
+ */
+VL_WS_Status VL_WS_getCountryID(VL_WS_Handle* handle, int* countryID);
+
+/*
+ * VL_WS_checkAdultVerificationEnabled - whether adult titles need the account's adult-content
+ * PIN. The code counts.
+ */
+VL_WS_Status VL_WS_checkAdultVerificationEnabled(VL_WS_Handle* handle, VL_WS_AdultVerificationEnabledResponse* answer);
+
+/*
+ * VL_WS_checkAdultVerificationPin - whether `pin` is the account's adult-content PIN. The PIN is
+ * sent as at least four digits ("%04d": 7 is sent as "0007"). The code counts; a wrong PIN is a
+ * successful answer with IsPinVerified false.
+ */
+VL_WS_Status VL_WS_checkAdultVerificationPin(VL_WS_Handle* handle, int pin, VL_WS_AdultVerificationPinResponse* answer);
+
+/*
+ * VL_WS_returnError, VL_WS_returnTimeout - test operations of the streaming service: the store
+ * answers with an error code, or holds its answer past the handle's receive time-out. They always
+ * go to the streaming service. The code counts.
+ */
+VL_WS_Status VL_WS_returnError(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
+VL_WS_Status VL_WS_returnTimeout(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
+
 /* ---------------------------------------------------------------------------------------------
  * Cache
  * ------------------------------------------------------------------------------------------- */
