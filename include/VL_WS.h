@@ -194,6 +194,177 @@ VL_WS_Status VL_WS_returnError(VL_WS_Handle* handle, VL_WS_StandardResponse* ans
 VL_WS_Status VL_WS_returnTimeout(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
 
 /* ---------------------------------------------------------------------------------------------
+ * Purchases and billing (account operations: see "Account operations in general")
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_doPurchaseSavedBilling - buy or rent the product `skuID` with the account's saved card,
+ * or with its prepaid funds when `usePrePaidFunds` is true. `ipAddress` (required) is the
+ * client's IP address as text.
+ *
+ * On success the answer holds the new pass (PassID, for the streaming operations) and the
+ * transaction. The store takes a bought title off the wishlist: with a cache of user data, the
+ * cached wishlist pages and every wishlist flag are deleted.
+ *
+ * The code counts: VL_WS_E_PURCHASE_1 to VL_WS_E_PURCHASE_12 for codes 1 to 12 (code n gives
+ * -1006 - n), VL_WS_E_PURCHASE_20, _21 and _22 for codes 20 to 22.
+ */
+VL_WS_Status VL_WS_doPurchaseSavedBilling(VL_WS_Handle* handle, int skuID, const char* ipAddress,
+                                          bool usePrePaidFunds, VL_WS_PurchaseResponse* answer);
+
+/*
+ * VL_WS_calcOrderTax - sub-total, tax and total of buying the product `skuID`, as the store's
+ * decimal texts. Always the streaming service.
+ *
+ * The code counts: VL_WS_E_ORDER_TAX_1, _2, _3, _11, _12 and _20 for codes 1, 2, 3, 11, 12 and 20.
+ */
+VL_WS_Status VL_WS_calcOrderTax(VL_WS_Handle* handle, int skuID, VL_WS_OrderTaxResponse* tax);
+
+/*
+ * VL_WS_getBillingInfoAndPPCBalance - the saved card and the prepaid balance in one answer, each
+ * part with its own code and message (a part the answer lacks stays empty). Always the streaming
+ * service. The code of the billing part counts.
+ */
+VL_WS_Status VL_WS_getBillingInfoAndPPCBalance(VL_WS_Handle* handle, VL_WS_BillingInfoAndPPCBalance* info);
+
+/*
+ * VL_WS_getPrePaidCardBalance - the account's prepaid balance. The code counts.
+ */
+VL_WS_Status VL_WS_getPrePaidCardBalance(VL_WS_Handle* handle, VL_WS_PrePaidCardBalanceResponse* balance);
+
+/*
+ * VL_WS_assignGiftCertificateToUser - redeem the gift certificate `code` (required) for the
+ * account; the answer holds the new balance.
+ *
+ * The code counts: VL_WS_E_GIFT_CERTIFICATE_1 and _2 for codes 1 and 2.
+ */
+VL_WS_Status VL_WS_assignGiftCertificateToUser(VL_WS_Handle* handle, const char* code,
+                                               VL_WS_GiftCertificateResponse* answer);
+
+/*
+ * VL_WS_checkRentalExpiration - whether to warn that the rental of pass `passID` runs out, and
+ * the hours it has left. The code counts.
+ */
+VL_WS_Status VL_WS_checkRentalExpiration(VL_WS_Handle* handle, int passID, VL_WS_RentalExpirationResponse* answer);
+
+/*
+ * VL_WS_checkForPurchasedTitle - whether the account holds a pass for title `titleID`.
+ *
+ * The handle's access type as it stands (VL_WS_getFileType may have changed it) chooses the
+ * service: DOWNLOAD asks the download service, any other type the streaming service. The status
+ * is the SOAP call's.
+ */
+VL_WS_Status VL_WS_checkForPurchasedTitle(VL_WS_Handle* handle, int titleID, bool* purchased);
+
+/*
+ * VL_WS_checkForPurchasedSku - whether the account holds a pass for the product `skuID`. Always
+ * the streaming service. The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_checkForPurchasedSku(VL_WS_Handle* handle, int skuID, bool* purchased);
+
+/*
+ * VL_WS_removeAllMyPurchases - delete every pass of the account; `password` (required) is the
+ * account's password. Always the streaming service. The code counts.
+ */
+VL_WS_Status VL_WS_removeAllMyPurchases(VL_WS_Handle* handle, const char* password, VL_WS_StandardResponse* answer);
+
+/*
+ * VL_WS_getTitleListingPurchaseds - the purchased title of each of the `count` passes in
+ * `passIDs` (both required), each with the store's code and message for its pass. Always the
+ * streaming service. The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_getTitleListingPurchaseds(VL_WS_Handle* handle, int count, const int* passIDs,
+                                             VL_WS_TitleListingPurchasedForPassArray* titles);
+
+/* ---------------------------------------------------------------------------------------------
+ * Wishlist (account operations: see "Account operations in general")
+ *
+ * With a cache of user data (CACHE_USERDATA) the client keeps a flag per title: whether it is on
+ * the wishlist. The changes below keep the flags up to date, and VL_WS_checkTitleInWishlist
+ * answers from them without asking the store.
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_addItemToWishlist, VL_WS_removeItemFromWishlist, VL_WS_removeAllItemsFromWishlist -
+ * change the wishlist. On success, with a cache of user data, the cached wishlist pages are
+ * deleted and the title's flag is set (added: true, removed: false), or every flag is deleted.
+ * The code counts.
+ */
+VL_WS_Status VL_WS_addItemToWishlist(VL_WS_Handle* handle, int titleID, VL_WS_StandardResponse* answer);
+VL_WS_Status VL_WS_removeItemFromWishlist(VL_WS_Handle* handle, int titleID, VL_WS_StandardResponse* answer);
+VL_WS_Status VL_WS_removeAllItemsFromWishlist(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
+
+/*
+ * VL_WS_checkTitleInWishlist - whether title `titleID` is on the wishlist.
+ *
+ * A cache of user data that holds the title's flag answers at once (VL_WS_OK, no request).
+ * Otherwise the catalogue service's details of the title tell, and the answer is kept as the
+ * title's flag. The code counts.
+ */
+VL_WS_Status VL_WS_checkTitleInWishlist(VL_WS_Handle* handle, int titleID, bool* inWishlist);
+
+/*
+ * VL_WS_checkTitlesInWishlist - whether each of the `count` titles in `titleIDs` (both required)
+ * is on the wishlist, one flag per title in the given order, into a bool array record.
+ *
+ * The wishlist is read page by page (50 titles per page, titles of `titleType`) until every
+ * title was found or the last page was read. With a cache of user data the flags of all given
+ * titles are then kept. A page that fails ends the reading with its status and the flags found
+ * so far; a page that the store refuses (a non-zero code) ends it with VL_WS_OK and the flags
+ * found so far. Flags of an unfinished reading are not kept. The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_checkTitlesInWishlist(VL_WS_Handle* handle, int count, const int* titleIDs, int titleType,
+                                         VL_WS_BoolArray* flags);
+
+/* ---------------------------------------------------------------------------------------------
+ * Streaming
+ *
+ * Playing a purchased title or a bonus asset. These operations always go to the streaming
+ * service, whatever the handle's access type, and use no cache. Results, null arguments and
+ * failed calls are handled as by the account operations (see "Account operations in general").
+ * File profile, audio profile, stream status and bonus asset type are the store's numbers.
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_getStreamingAssetLocation - where pass `passID` streams from in `fileProfile`: the
+ * stream's URL, its DRM servers, a new stream instance (StreamID) with its heartbeat, and where
+ * playback resumes. VL_WS_loadLastStreamingAssetLocation answers the pass's last stream instance
+ * instead of a new one; VL_WS_getStreamingBonusAssetLocation the stream of a bonus asset. The
+ * code counts.
+ */
+VL_WS_Status VL_WS_getStreamingAssetLocation(VL_WS_Handle* handle, int passID, int fileProfile,
+                                             VL_WS_StreamingAssetLocationResponse* location);
+VL_WS_Status VL_WS_getStreamingBonusAssetLocation(VL_WS_Handle* handle, int bonusAssetID,
+                                                  VL_WS_StreamingAssetLocationResponse* location);
+VL_WS_Status VL_WS_loadLastStreamingAssetLocation(VL_WS_Handle* handle, int passID, int fileProfile,
+                                                  VL_WS_StreamingAssetLocationResponse* location);
+
+/*
+ * VL_WS_manageStreamingInstanceStatus - report that stream instance `streamID` (required) is in
+ * `status`, `stopTimeSeconds` into the title. The code counts.
+ */
+VL_WS_Status VL_WS_manageStreamingInstanceStatus(VL_WS_Handle* handle, const char* streamID, int status,
+                                                 int stopTimeSeconds, VL_WS_StandardResponse* answer);
+
+/*
+ * VL_WS_getTHXMediaDirector, VL_WS_getTHXMediaDirectorBonusAsset - THX media director settings
+ * of a pass in a file and audio profile, or of a bonus asset. The status is the SOAP call's: a
+ * title without settings is an answer with a non-zero code and status VL_WS_OK.
+ */
+VL_WS_Status VL_WS_getTHXMediaDirector(VL_WS_Handle* handle, int passID, int fileProfile, int audioProfile,
+                                       VL_WS_THXMediaDirectorResponse* settings);
+VL_WS_Status VL_WS_getTHXMediaDirectorBonusAsset(VL_WS_Handle* handle, int bonusAssetID, int fileProfile,
+                                                 int bonusAssetType, VL_WS_THXMediaDirectorResponse* settings);
+
+/*
+ * VL_WS_setAudioDefaultProperty, VL_WS_getAudioDefaultProperty - set or read the account's
+ * default audio profile. The status is the SOAP call's; the code of the setting stays in the
+ * record.
+ */
+VL_WS_Status VL_WS_setAudioDefaultProperty(VL_WS_Handle* handle, int audioProfile, VL_WS_StandardResponse* answer);
+VL_WS_Status VL_WS_getAudioDefaultProperty(VL_WS_Handle* handle, int* audioProfile);
+
+/* ---------------------------------------------------------------------------------------------
  * Cache
  * ------------------------------------------------------------------------------------------- */
 
