@@ -6,23 +6,18 @@
 #include "VL_WS.h"
 #include "VL_WS_Client.h"
 
-namespace {
-VLLogArea s_Log(VLWSAELOG_AREA_NAME);
-}  // namespace
+static VLLogArea s_Log(VLWSAELOG_AREA_NAME);
 
 extern "C" VL_WS_Status VL_WS_getLastCacheLoadTimeUTC(VL_WS_Handle* handle, VL_WS_String* utcTime) {
-  if (utcTime == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLRecordInit(*utcTime);
-  VL_WS_Client* client = VLClientOf(handle);
+  VL_WS_Client* client = VLClientFor(handle, utcTime);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
 
-  RealTimeBrowse& service = client->m_RealTimeBrowse;
-  _VL1__getLastCacheLoadTimeUTC* request = soap_new__VL1__getLastCacheLoadTimeUTC(&service);
-  _VL1__getLastCacheLoadTimeUTCResponse* response = soap_new__VL1__getLastCacheLoadTimeUTCResponse(&service);
-  int soapError = request && response ? service.Setup("getLastCacheLoadTimeUTC") : SOAP_EOM;
-  if (soapError == SOAP_OK) soapError = service.getLastCacheLoadTimeUTC(request, response);
-  if (soapError == SOAP_OK) VLRecordSetString(*utcTime, response->getLastCacheLoadTimeUTCResult);
-  VLEndCall(service);
+  int soapError = VLPlainCall(client->m_RealTimeBrowse, "getLastCacheLoadTimeUTC",
+                              soap_new__VL1__getLastCacheLoadTimeUTC, soap_new__VL1__getLastCacheLoadTimeUTCResponse,
+                              &RealTimeBrowse::getLastCacheLoadTimeUTC,
+                              [&](const _VL1__getLastCacheLoadTimeUTCResponse& response) {
+                                VLRecordSetString(*utcTime, response.getLastCacheLoadTimeUTCResult);
+                              });
   VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, ret:%d,utctime:%s\n", "VL_WS_getLastCacheLoadTimeUTC", soapError,
                         utcTime->Text ? utcTime->Text : "");
   return VLUtilities::To_VL_WS_Status(soapError);

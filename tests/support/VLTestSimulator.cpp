@@ -37,3 +37,23 @@ VL_WS_SetupParams VLTestSetupParams() {
   params.AccessType = STREAM;
   return params;
 }
+
+void VLSimClientTest::SetUp() {
+  m_Sim.ClearFaults();
+  m_Sim.ClearRequests();
+}
+
+void VLSimClientTest::TearDown() {
+  VL_WS_release(&m_Handle);
+  m_Sim.ClearFaults();
+}
+
+std::vector<VLSimRequest> VLSimClientTest::Requests(size_t count) {
+  m_Sim.WaitForRequests(count, 5000);
+  return m_Sim.Requests();
+}
+
+void VLSimClientTest::Fault(const std::string& spec) {
+  std::string error;
+  ASSERT_TRUE(m_Sim.AddFault(spec, &error)) << error;
+}

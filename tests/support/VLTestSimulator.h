@@ -3,6 +3,10 @@
 #ifndef VLTESTSIMULATOR_H
 #define VLTESTSIMULATOR_H
 
+#include <gtest/gtest.h>
+
+#include <vector>
+
 #include "VLSimServer.h"
 #include "VL_WS.h"
 
@@ -16,5 +20,21 @@ VLSimServer& VLTestSimulator();
 // "00-11-22-33-44-55" of type 7, the general catalogue in production, access type STREAM (no
 // question to the store), no cache and no proxy. The strings are static.
 VL_WS_SetupParams VLTestSetupParams();
+
+// A test on the program's simulator with one client handle: it starts without faults and with an
+// empty request log, and its handle is released at its end.
+class VLSimClientTest : public testing::Test {
+ protected:
+  void SetUp() override;
+  void TearDown() override;
+
+  // The request log once it holds count requests (waiting up to 5 s): the simulator logs a
+  // request after its answer went out, and the client may be done with the answer before.
+  std::vector<VLSimRequest> Requests(size_t count);
+  void Fault(const std::string& spec);
+
+  VLSimServer& m_Sim = VLTestSimulator();
+  VL_WS_Handle m_Handle = {};
+};
 
 #endif  // VLTESTSIMULATOR_H
