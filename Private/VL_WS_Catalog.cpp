@@ -1,6 +1,8 @@
 // Catalogue operations of the client: the genre tree, pages of titles, title and episode details,
 // search, recommendations and the translation of TiVo and SKU identifiers, all answered by the
 // catalogue service and, where they are cached, by the handle's cache first (VLCachedCall.h).
+#include <string.h>
+
 #include "VLCachedCall.h"
 #include "VLRecord.h"
 #include "VLUtilities.h"
@@ -149,6 +151,9 @@ extern "C" VL_WS_Status VL_WS_getTitlesByGenreIDs(VL_WS_Handle* handle, int coun
           request.GenreIDs->int_ = ids;
           request.GenreIDs->__sizeint = count;
         }
+        request.CurrentPageNumber = currentPageNumber;
+        request.ItemsPerPage = itemsPerPage;
+        request.PurchaseType = static_cast<VL1__StreamAPIPurchaseType>(purchaseType);
       },
       [&](const VL1__ArrayOfGetTitlesResponse& result) {
         VLUtilities::VL1__ArrayOfGetTitlesResponse2VL_WS_TitlesResponseArray(&result, *pages);
@@ -193,7 +198,11 @@ extern "C" VL_WS_Status VL_WS_getAllTvEpisodeListings(VL_WS_Handle* handle, int 
       [&](_VL1__getAllTvEpisodeListings& request) { request.TitleID = titleID; },
       [&](const VL1__ArrayOfTitleListingResponse& result) {
         VLUtilities::VL1__ArrayOfTitleListingResponse2VL_WS_TitleListingResponseArray(&result, *listings);
-        return listings->Count > 0;
+        // Kept when there is a listing and none of them is a refusal: an error is never served
+        // from the cache.
+        bool refused = false;
+        for (int i = 0; i < listings->Count; ++i) refused = refused || listings->Items[i].ResponseCode != 0;
+        return listings->Count > 0 && !refused;
       },
       [](CacheInterface& cache, const VL1__ArrayOfTitleListingResponse& result) {
         VLWS_IntVector titles;
