@@ -26,6 +26,7 @@ class VL1__CheckAdultVerificationPinResponse;
 class VL1__CheckRentalExpirationResponse;
 class VL1__GetConfigResponse;
 class VL1__GetEmailAddressResponse;
+class VL1__GetGenreLabelResponse;
 class VL1__GetMyVideosResponse;
 class VL1__GetStreamingAssetLocationResponse;
 class VL1__GetTitlesResponse;
@@ -40,6 +41,7 @@ class VL1__THXMediaDirectorResponse;
 class VL1__TitleListing;
 class VL1__TitleListingPurchased;
 class VL1__TitleListingResponse;
+class VL1__TranslateSkuIdResponse;
 class VL1__TranslatedTivoExternalIdResponse;
 class VL1__TvEpisodeList;
 class VL1__WishListActionResponse;
@@ -118,10 +120,14 @@ class VLUtilities {
   static void VL1__RecommendedTitlesResponse2VL_WS_RecommendedTitlesResponse(
       const VL1__RecommendedTitlesResponse* t, VL_WS_RecommendedTitlesResponse& r);
   static void VL1__ArrayOfGenre2VL_WS_GenreArray(const VL1__ArrayOfGenre* t, VL_WS_GenreArray& r);
+  static void VL1__GetGenreLabelResponse2VL_WS_GenreLabelResponse(const VL1__GetGenreLabelResponse* t,
+                                                                 VL_WS_GenreLabelResponse& r);
   static void VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse(const VL1__TvEpisodeList* t,
                                                              VL_WS_TvEpisodeListResponse& r);
   static void VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExternalIDResponse(
       const VL1__TranslatedTivoExternalIdResponse* t, VL_WS_TranslateTivoExternalIDResponse& r);
+  static void VL1__TranslateSkuIdResponse2VL_WS_TranslateSkuIDResponse(const VL1__TranslateSkuIdResponse* t,
+                                                                       VL_WS_TranslateSkuIDResponse& r);
   // The purchase fields and the title fields.
   static void VL1__TitleListingPurchased2VL_WS_TitleListingPurchased(
       const VL1__TitleListingPurchased* t, VL_WS_TitleListingPurchased& r);

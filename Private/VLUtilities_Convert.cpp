@@ -189,6 +189,14 @@ void VLUtilities::VL1__ArrayOfGenre2VL_WS_GenreArray(const VL1__ArrayOfGenre* t,
   });
 }
 
+void VLUtilities::VL1__GetGenreLabelResponse2VL_WS_GenreLabelResponse(const VL1__GetGenreLabelResponse* t,
+                                                                     VL_WS_GenreLabelResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.Label = Text(t->Label);
+  r.LabelMessage = Text(t->LabelMessage);
+}
+
 void VLUtilities::VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse(const VL1__TvEpisodeList* t,
                                                                  VL_WS_TvEpisodeListResponse& r) {
   VL_ASSERT(t != 0);
@@ -202,6 +210,13 @@ void VLUtilities::VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExtern
   r.TivoExternalId = Text(t->TivoExternalId);
   r.TitleId = t->TitleId;
   VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+}
+
+void VLUtilities::VL1__TranslateSkuIdResponse2VL_WS_TranslateSkuIDResponse(const VL1__TranslateSkuIdResponse* t,
+                                                                           VL_WS_TranslateSkuIDResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.TitleId = t->TitleId;
 }
 
 void VLUtilities::VL1__TitleListingPurchased2VL_WS_TitleListingPurchased(

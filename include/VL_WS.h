@@ -365,6 +365,111 @@ VL_WS_Status VL_WS_setAudioDefaultProperty(VL_WS_Handle* handle, int audioProfil
 VL_WS_Status VL_WS_getAudioDefaultProperty(VL_WS_Handle* handle, int* audioProfile);
 
 /* ---------------------------------------------------------------------------------------------
+ * Catalogue
+ *
+ * Every catalogue operation fills the record it is given (tagged even when the call fails, so
+ * always release it) and asks the store's catalogue service. Pages are given as a pair of ints,
+ * CurrentPageNumber then ItemsPerPage; purchase types (0 rent, 1 buy, 2 any) and title types
+ * (0 all, 1 television, 2 movies) are the store's numbers.
+ *
+ * A handle that caches catalogue answers (CACHE_METADATA) answers repeated requests with the
+ * same arguments from its cache, without a request; only successful answers are kept (response
+ * code 0, or a list that is not empty) and VL_WS_updateLocalCache drops them all when the store
+ * loaded a new catalogue. Operations marked "code folded" return VL_WS_E_UNEXPECTED for a
+ * non-zero ResponseCode of the store (the record still holds it); the others return VL_WS_OK and
+ * leave the code in the record for the caller.
+ *
+ * Besides the failures named, every operation returns VL_WS_E_INVALID_ARGUMENT for a null record
+ * or a handle without client state, and the status of a failed SOAP call (VL_WS_E_CONNECT,
+ * VL_WS_E_TLS, VL_WS_E_HTTP_STATUS(n), VL_WS_E_SOAP_FAULT(n), ...), after which the record holds
+ * nothing but its tags.
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_getNavigation - the store's genre tree as a flat list of genres (each with its parent's
+ * ID) into a genre array (release it). Cached (one tree per cache); a tree without genres is
+ * returned but never kept. The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_getNavigation(VL_WS_Handle* handle, VL_WS_GenreArray* genres);
+
+/*
+ * VL_WS_getGenreLabel - the label and label message of a genre. Never cached; code folded.
+ */
+VL_WS_Status VL_WS_getGenreLabel(VL_WS_Handle* handle, int genreID, VL_WS_GenreLabelResponse* label);
+
+/*
+ * VL_WS_getTitles - one page of the titles of a genre (and of the genres below it). Cached by
+ * all four arguments; code folded.
+ */
+VL_WS_Status VL_WS_getTitles(VL_WS_Handle* handle, int genreID, int currentPageNumber, int itemsPerPage,
+                             int purchaseType, VL_WS_TitlesResponse* titles);
+
+/*
+ * VL_WS_getTitlesByGenreIDs - the same page of each of `count` genres, one VL_WS_TitlesResponse
+ * per page the store returned, in its order (read each page's ResponseCode). Never cached; the
+ * status is the SOAP call's. VL_WS_E_INVALID_ARGUMENT also for a count below 1 or a null
+ * `genreIDs`.
+ */
+VL_WS_Status VL_WS_getTitlesByGenreIDs(VL_WS_Handle* handle, int count, const int* genreIDs, int currentPageNumber,
+                                       int itemsPerPage, int purchaseType, VL_WS_TitlesResponseArray* pages);
+
+/*
+ * VL_WS_getTitleListing - the details of a title. Cached by the title ID; code folded. The
+ * answer also tells whether the title is in the account's wishlist: when the answer is kept,
+ * that is stored as the title's wishlist flag (with CACHE_USERDATA).
+ */
+VL_WS_Status VL_WS_getTitleListing(VL_WS_Handle* handle, int titleID, VL_WS_TitleListingResponse* details);
+
+/*
+ * VL_WS_getTvEpisodeListing - the details of one episode of a series. Cached by the episode ID;
+ * code folded; the series' wishlist flag is stored as with VL_WS_getTitleListing.
+ */
+VL_WS_Status VL_WS_getTvEpisodeListing(VL_WS_Handle* handle, int episodeID, VL_WS_TitleListingResponse* details);
+
+/*
+ * VL_WS_getTvEpisodeListByTitleID - the episodes (ID, name, number) of a series. Cached by the
+ * title ID; code folded.
+ */
+VL_WS_Status VL_WS_getTvEpisodeListByTitleID(VL_WS_Handle* handle, int titleID, VL_WS_TvEpisodeListResponse* episodes);
+
+/*
+ * VL_WS_getAllTvEpisodeListings - the details of every episode of a series, in the store's
+ * order (read each one's ResponseCode). Cached by the title ID when the list is not empty, with
+ * the wishlist flags of the listings; the status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_getAllTvEpisodeListings(VL_WS_Handle* handle, int titleID, VL_WS_TitleListingResponseArray* listings);
+
+/*
+ * VL_WS_translateTivoExternalID - the title of a TiVo external ID. Cached by the ID's text; the
+ * status is the SOAP call's. VL_WS_E_INVALID_ARGUMENT also for a null `tivoExternalID`.
+ */
+VL_WS_Status VL_WS_translateTivoExternalID(VL_WS_Handle* handle, const char* tivoExternalID,
+                                           VL_WS_TranslateTivoExternalIDResponse* translation);
+
+/*
+ * VL_WS_translateSkuID - the title of a SKU. Cached by the SKU ID; the status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_translateSkuID(VL_WS_Handle* handle, int skuID, VL_WS_TranslateSkuIDResponse* translation);
+
+/*
+ * VL_WS_searchForTitle - one page of the titles whose name matches `query`;
+ * VL_WS_searchForTitleDetail also searches synopsis, actors and directors. Cached by all five
+ * arguments (the whole query, whatever its length); the status is the SOAP call's.
+ * VL_WS_E_INVALID_ARGUMENT also for a null or empty `query`.
+ */
+VL_WS_Status VL_WS_searchForTitle(VL_WS_Handle* handle, int currentPageNumber, int itemsPerPage, int purchaseType,
+                                  int titleType, const char* query, VL_WS_TitlesResponse* titles);
+VL_WS_Status VL_WS_searchForTitleDetail(VL_WS_Handle* handle, int currentPageNumber, int itemsPerPage,
+                                        int purchaseType, int titleType, const char* query,
+                                        VL_WS_TitlesResponse* titles);
+
+/*
+ * VL_WS_getRecommendedTitles - titles the store recommends with a title. Cached by the title ID;
+ * code folded.
+ */
+VL_WS_Status VL_WS_getRecommendedTitles(VL_WS_Handle* handle, int titleID, VL_WS_RecommendedTitlesResponse* titles);
+
+/* ---------------------------------------------------------------------------------------------
  * Cache
  * ------------------------------------------------------------------------------------------- */
 
@@ -376,6 +481,16 @@ VL_WS_Status VL_WS_getAudioDefaultProperty(VL_WS_Handle* handle, int* audioProfi
  * or a null `utcTime`.
  */
 VL_WS_Status VL_WS_getLastCacheLoadTimeUTC(VL_WS_Handle* handle, VL_WS_String* utcTime);
+
+/*
+ * VL_WS_shouldUpdateCache - ask the store whether a catalogue load time (a text as
+ * VL_WS_getLastCacheLoadTimeUTC gives it) is out of date. `update` is set to false first, then
+ * to true when the store says so. The handle's cache is not touched.
+ *
+ * Returns VL_WS_OK or the status of the SOAP call; VL_WS_E_INVALID_ARGUMENT for no client state,
+ * a null or empty `utcTime` or a null `update`.
+ */
+VL_WS_Status VL_WS_shouldUpdateCache(VL_WS_Handle* handle, const char* utcTime, bool* update);
 
 /*
  * VL_WS_updateLocalCache - refresh the kinds of cached data in `dataKinds` (bits of
@@ -390,6 +505,16 @@ VL_WS_Status VL_WS_getLastCacheLoadTimeUTC(VL_WS_Handle* handle, VL_WS_String* u
  * client state.
  */
 VL_WS_Status VL_WS_updateLocalCache(VL_WS_Handle* handle, int dataKinds);
+
+/*
+ * VL_WS_clearLocalCache - remove the cache files in the folder `folder`: the box-art images
+ * ("*.jpg"), the cache databases ("*.vl") and the temporary files ("vlws*"), in that order. It
+ * needs no handle; a cache still open on a removed database keeps working on its open file.
+ *
+ * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (null or empty `folder`) or VL_WS_E_FILE (the folder
+ * cannot be listed or a file cannot be removed; the removal stops at the first failure).
+ */
+VL_WS_Status VL_WS_clearLocalCache(const char* folder);
 
 /* ---------------------------------------------------------------------------------------------
  * Box art
