@@ -32,112 +32,128 @@ extern "C" VL_WS_Status VL_WS_getFileType(VL_WS_Handle* handle, VL_WS_FileType* 
 }
 
 extern "C" VL_WS_Status VL_WS_authorizeDevice(VL_WS_Handle* handle, int pin, VL_WS_AuthorizeDeviceResponse* answer) {
-  VL_WS_Client* client = VLBeginCall(handle, answer);
+  VL_WS_Client* client = VLClientFor(handle, answer);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   bool answered = false;
-  int error = VLCallInto(client->m_StreamDownloadAPI, "authorizeDevice", &StreamDownloadAPI::authorizeDevice,
-                         [pin](_VL1__authorizeDevice& request) { request.Pin = pin; },
-                         &_VL1__authorizeDeviceResponse::authorizeDeviceResult,
-                         VLUtilities::VL1__AuthorizeDeviceResponse2VL_WS_AuthorizeDeviceResponse, *answer, &answered);
-  if (VLSucceeded(error, answered, answer->ResponseCode)) {
+  int soapError = VLServiceCall(
+      *client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, authorizeDevice),
+      [pin](_VL1__authorizeDevice& request) { request.Pin = pin; },
+      VLInto(VLUtilities::VL1__AuthorizeDeviceResponse2VL_WS_AuthorizeDeviceResponse, *answer, &answered));
+  if (VLSucceeded(soapError, answered, answer->ResponseCode)) {
     // The next request speaks for the new account; nothing of the previous user's data may stay.
     client->m_Params.AuthToken = answer->AuthToken;
     if (CacheInterface* cache = VLUserData(client)) cache->PurgeUserData(VLString());
   }
-  return VLFoldedStatus("VL_WS_authorizeDevice", error, *answer, "VL_WS_authorizeDevice");
+  return VLFoldedStatus("VL_WS_authorizeDevice", soapError, answer->ResponseCode, "VL_WS_authorizeDevice");
 }
 
 extern "C" VL_WS_Status VL_WS_deactivateDevice(VL_WS_Handle* handle, VL_WS_StandardResponse* answer) {
-  VL_WS_Client* client = VLBeginCall(handle, answer);
+  VL_WS_Client* client = VLClientFor(handle, answer);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   bool answered = false;
-  int error = VLCallInto(client->m_StreamDownloadAPI, "deactivateDevice", &StreamDownloadAPI::deactivateDevice,
-                         VLNoFields(), &_VL1__deactivateDeviceResponse::deactivateDeviceResult,
-                         VLUtilities::VL1__StandardResponse2VL_WS_StandardResponse, *answer, &answered);
-  if (VLSucceeded(error, answered, answer->ResponseCode)) {
+  int soapError = VLServiceCall(*client, client->m_StreamDownloadAPI,
+                                VL_SERVICE_OPERATION(StreamDownloadAPI, deactivateDevice), VLNoFields(),
+                                VLInto(VLUtilities::VL1__StandardResponse2VL_WS_StandardResponse, *answer, &answered));
+  if (VLSucceeded(soapError, answered, answer->ResponseCode)) {
     client->m_Params.AuthToken = VLString();
     if (CacheInterface* cache = VLUserData(client)) cache->PurgeUserData(VLString());
   }
-  return VLFoldedStatus("VL_WS_deactivateDevice", error, *answer);
+  return VLFoldedStatus("VL_WS_deactivateDevice", soapError, answer->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_checkAuthToken(VL_WS_Handle* handle, bool* valid) {
-  VL_WS_Client* client = VLBeginCall(handle, valid);
+  VL_WS_Client* client = VLClientFor(handle, valid);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  int error = VLCall(client->m_StreamDownloadAPI, "checkAuthToken", &StreamDownloadAPI::checkAuthToken, VLNoFields(),
-                     [valid](const _VL1__checkAuthTokenResponse& response) {
-                       *valid = response.checkAuthTokenResult == true_;
-                     });
+  int soapError =
+      VLServiceCall(*client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, checkAuthToken),
+                    VLNoFields(), [valid](const xsd__boolean& result) { *valid = result == true_; });
   // The user data belong to the token's account: they go when the token turns valid or invalid.
   CacheInterface* cache = VLUserData(client);
-  if (error == SOAP_OK && cache != 0 && *valid != client->m_Params.AuthTokenValid) {
+  if (soapError == SOAP_OK && cache != 0 && *valid != client->m_Params.AuthTokenValid) {
     client->m_Params.AuthTokenValid = *valid;
     cache->PurgeUserData(VLString());
   }
-  return VLBoolStatus("VL_WS_checkAuthToken", error, *valid);
+  return VLBoolStatus("VL_WS_checkAuthToken", soapError, *valid);
+}
+
+extern "C" VL_WS_Status VL_WS_getEmailAddress(VL_WS_Handle* handle, VL_WS_EmailAddressResponse* answer) {
+  VL_WS_Client* client = VLClientFor(handle, answer);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  VLCacheEntry entry = {VLCacheKind::kUserData, "getEmailAddress", VLString()};
+  int soapError = VLCachedCall(
+      *client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, getEmailAddress), &entry,
+      VLNoFields(), VLKeptInto(VLUtilities::VL1__GetEmailAddressResponse2VL_WS_EmailAddressResponse, *answer));
+  return VLFoldedStatus("VL_WS_getEmailAddress", soapError, answer->ResponseCode);
+}
+
+extern "C" VL_WS_Status VL_WS_getSettingsPageInfo(VL_WS_Handle* handle, VL_WS_SettingsPageResponse* answer) {
+  VL_WS_Client* client = VLClientFor(handle, answer);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  VLCacheEntry entry = {VLCacheKind::kUserData, "getSettingsPageInfo", VLString()};
+  int soapError = VLCachedCall(*client, client->m_StreamDownloadAPI,
+                               VL_SERVICE_OPERATION(StreamDownloadAPI, getSettingsPageInfo), &entry, VLNoFields(),
+                               VLKeptInto(VLUtilities::VL1__SettingsPageInfo2VL_WS_SettingsPageResponse, *answer));
+  return VLFoldedStatus("VL_WS_getSettingsPageInfo", soapError, answer->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_getConfig(VL_WS_Handle* handle, VL_WS_ConfigResponse* config) {
-  VL_WS_Client* client = VLBeginCall(handle, config);
+  VL_WS_Client* client = VLClientFor(handle, config);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  int error = VLCallInto(client->m_StreamDownloadAPI, "getConfig", &StreamDownloadAPI::getConfig, VLNoFields(),
-                         &_VL1__getConfigResponse::getConfigResult,
-                         VLUtilities::VL1__GetConfigResponse2VL_WS_ConfigResponse, *config);
-  return VLFoldedStatus("VL_WS_getConfig", error, *config);
+  int soapError =
+      VLServiceCall(*client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, getConfig),
+                    VLNoFields(), VLInto(VLUtilities::VL1__GetConfigResponse2VL_WS_ConfigResponse, *config));
+  return VLFoldedStatus("VL_WS_getConfig", soapError, config->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_getCountryID(VL_WS_Handle* handle, int* countryID) {
-  VL_WS_Client* client = VLBeginCall(handle, countryID);
+  VL_WS_Client* client = VLClientFor(handle, countryID);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  int error = VLCall(client->m_StreamDownloadAPI, "GetCountryID", &StreamDownloadAPI::GetCountryID, VLNoFields(),
-                     [countryID](const _VL1__GetCountryIDResponse& response) {
-                       *countryID = response.GetCountryIDResult;
-                     });
-  VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, ret:%d,countryid:%d\n", "VL_WS_getCountryID", error, *countryID);
-  return VLUtilities::To_VL_WS_Status(error);
+  int soapError =
+      VLServiceCall(*client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, GetCountryID),
+                    VLNoFields(), [countryID](const int& result) { *countryID = result; });
+  VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, ret:%d,countryid:%d\n", "VL_WS_getCountryID", soapError, *countryID);
+  return VLUtilities::To_VL_WS_Status(soapError);
 }
 
 extern "C" VL_WS_Status VL_WS_checkAdultVerificationEnabled(VL_WS_Handle* handle,
                                                             VL_WS_AdultVerificationEnabledResponse* answer) {
-  VL_WS_Client* client = VLBeginCall(handle, answer);
+  VL_WS_Client* client = VLClientFor(handle, answer);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  int error = VLCallInto(
-      client->m_StreamDownloadAPI, "checkAdultVerificationEnabled", &StreamDownloadAPI::checkAdultVerificationEnabled,
-      VLNoFields(), &_VL1__checkAdultVerificationEnabledResponse::checkAdultVerificationEnabledResult,
-      VLUtilities::VL1__CheckAdultVerificationEnabledResponse2VL_WS_AdultVerificationEnabledResponse, *answer);
-  return VLFoldedStatus("VL_WS_checkAdultVerificationEnabled", error, *answer);
+  int soapError = VLServiceCall(
+      *client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, checkAdultVerificationEnabled),
+      VLNoFields(),
+      VLInto(VLUtilities::VL1__CheckAdultVerificationEnabledResponse2VL_WS_AdultVerificationEnabledResponse, *answer));
+  return VLFoldedStatus("VL_WS_checkAdultVerificationEnabled", soapError, answer->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_checkAdultVerificationPin(VL_WS_Handle* handle, int pin,
                                                         VL_WS_AdultVerificationPinResponse* answer) {
-  VL_WS_Client* client = VLBeginCall(handle, answer);
+  VL_WS_Client* client = VLClientFor(handle, answer);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   // The store compares texts: PIN 7 is "0007".
   char text[16];
   VLUtilities::safe_snprintf(text, sizeof(text), "%04d", pin);
-  int error = VLCallInto(client->m_StreamDownloadAPI, "checkAdultVerificationPin",
-                         &StreamDownloadAPI::checkAdultVerificationPin,
-                         [&text](_VL1__checkAdultVerificationPin& request) { request.Pin = text; },
-                         &_VL1__checkAdultVerificationPinResponse::checkAdultVerificationPinResult,
-                         VLUtilities::VL1__CheckAdultVerificationPinResponse2VL_WS_AdultVerificationPinResponse,
-                         *answer);
-  return VLFoldedStatus("VL_WS_checkAdultVerificationPin", error, *answer);
+  int soapError = VLServiceCall(
+      *client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, checkAdultVerificationPin),
+      [&text](_VL1__checkAdultVerificationPin& request) { request.Pin = text; },
+      VLInto(VLUtilities::VL1__CheckAdultVerificationPinResponse2VL_WS_AdultVerificationPinResponse, *answer));
+  return VLFoldedStatus("VL_WS_checkAdultVerificationPin", soapError, answer->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_returnError(VL_WS_Handle* handle, VL_WS_StandardResponse* answer) {
-  VL_WS_Client* client = VLBeginCall(handle, answer);
+  VL_WS_Client* client = VLClientFor(handle, answer);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  int error = VLCallInto(client->m_StreamAPI, "ReturnError", &StreamAPI::ReturnError, VLNoFields(),
-                         &_VL1__ReturnErrorResponse::ReturnErrorResult,
-                         VLUtilities::VL1__StandardResponse2VL_WS_StandardResponse, *answer);
-  return VLUtilities::To_VL_WS_Status(error, answer->ResponseCode, "");
+  int soapError =
+      VLServiceCall(*client, client->m_StreamAPI, VL_SERVICE_OPERATION(StreamAPI, ReturnError), VLNoFields(),
+                    VLInto(VLUtilities::VL1__StandardResponse2VL_WS_StandardResponse, *answer));
+  return VLUtilities::To_VL_WS_Status(soapError, answer->ResponseCode, "");
 }
 
 extern "C" VL_WS_Status VL_WS_returnTimeout(VL_WS_Handle* handle, VL_WS_StandardResponse* answer) {
-  VL_WS_Client* client = VLBeginCall(handle, answer);
+  VL_WS_Client* client = VLClientFor(handle, answer);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  int error = VLCallInto(client->m_StreamAPI, "ReturnTimeout", &StreamAPI::ReturnTimeout, VLNoFields(),
-                         &_VL1__ReturnTimeoutResponse::ReturnTimeoutResult,
-                         VLUtilities::VL1__StandardResponse2VL_WS_StandardResponse, *answer);
-  return VLUtilities::To_VL_WS_Status(error, answer->ResponseCode, "");
+  int soapError =
+      VLServiceCall(*client, client->m_StreamAPI, VL_SERVICE_OPERATION(StreamAPI, ReturnTimeout), VLNoFields(),
+                    VLInto(VLUtilities::VL1__StandardResponse2VL_WS_StandardResponse, *answer));
+  return VLUtilities::To_VL_WS_Status(soapError, answer->ResponseCode, "");
 }

@@ -1,4 +1,5 @@
-// The steps that the store operations share: results, statuses and their log line.
+// The steps that the account, purchase, wishlist and streaming operations share: bool and int
+// results, statuses and their result lines.
 #include "VL_WS_Call.h"
 
 #include "VLUtilities.h"
@@ -8,32 +9,27 @@ namespace {
 
 VLLogArea s_Log(VLWSAELOG_AREA_NAME);
 
-void LogResult(const char* name, int soapError, const VL_WS_StandardResponse& record) {
-  VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, ret:%d,responseCode:%d\n", name, soapError, record.ResponseCode);
-}
-
 }  // namespace
 
-VL_WS_Client* VLBeginCall(VL_WS_Handle* handle, bool* value) {
+VL_WS_Client* VLClientFor(const VL_WS_Handle* handle, bool* value) {
   if (value == 0) return 0;
   *value = false;
   return VLClientOf(handle);
 }
 
-VL_WS_Client* VLBeginCall(VL_WS_Handle* handle, int* value) {
+VL_WS_Client* VLClientFor(const VL_WS_Handle* handle, int* value) {
   if (value == 0) return 0;
   *value = 0;
   return VLClientOf(handle);
 }
 
-VL_WS_Status VLFoldedStatus(const char* name, int soapError, const VL_WS_StandardResponse& record,
-                            const char* statusRow) {
-  LogResult(name, soapError, record);
-  return VLUtilities::To_VL_WS_Status(soapError, record.ResponseCode, statusRow);
+VL_WS_Status VLFoldedStatus(const char* name, int soapError, int responseCode, const char* statusRow) {
+  VLLogCallResult(name, soapError, responseCode);
+  return VLUtilities::To_VL_WS_Status(soapError, responseCode, statusRow);
 }
 
-VL_WS_Status VLSoapStatus(const char* name, int soapError, const VL_WS_StandardResponse& record) {
-  LogResult(name, soapError, record);
+VL_WS_Status VLSoapStatus(const char* name, int soapError, int responseCode) {
+  VLLogCallResult(name, soapError, responseCode);
   return VLUtilities::To_VL_WS_Status(soapError);
 }
 

@@ -161,6 +161,29 @@ VL_WS_Status VL_WS_deactivateDevice(VL_WS_Handle* handle, VL_WS_StandardResponse
 VL_WS_Status VL_WS_checkAuthToken(VL_WS_Handle* handle, bool* valid);
 
 /*
+ * Answers kept as user data
+ *
+ * With a cache of user data (CACHE_USERDATA) the answers of VL_WS_getEmailAddress,
+ * VL_WS_getSettingsPageInfo, VL_WS_getBillingInfo, VL_WS_getWishlistItems and (on the streaming
+ * service) VL_WS_getMyVideos are kept, those with ResponseCode 0 only, and the next call with the
+ * same arguments is answered from the cache without a request. They are deleted with the user
+ * data: when the device is authorised or deactivated, when the token check changes its answer,
+ * by VL_WS_updateLocalCache(handle, CACHE_USERDATA), and (wishlist pages) when the wishlist
+ * changes or a purchase succeeds.
+ */
+
+/*
+ * VL_WS_getEmailAddress - the account's e-mail address; kept as user data. The code counts.
+ */
+VL_WS_Status VL_WS_getEmailAddress(VL_WS_Handle* handle, VL_WS_EmailAddressResponse* answer);
+
+/*
+ * VL_WS_getSettingsPageInfo - the account and the device's name for the settings page; kept as
+ * user data. The code counts.
+ */
+VL_WS_Status VL_WS_getSettingsPageInfo(VL_WS_Handle* handle, VL_WS_SettingsPageResponse* answer);
+
+/*
  * VL_WS_getConfig - the store's configuration for the device: key and value texts, in the
  * store's order (the bandwidth probe's URL among them). The code counts.
  */
@@ -221,6 +244,13 @@ VL_WS_Status VL_WS_doPurchaseSavedBilling(VL_WS_Handle* handle, int skuID, const
 VL_WS_Status VL_WS_calcOrderTax(VL_WS_Handle* handle, int skuID, VL_WS_OrderTaxResponse* tax);
 
 /*
+ * VL_WS_getBillingInfo - the account's saved card; kept as user data.
+ *
+ * The code counts: VL_WS_E_BILLING_INFO_1 to _4 for codes 1 to 4.
+ */
+VL_WS_Status VL_WS_getBillingInfo(VL_WS_Handle* handle, VL_WS_BillingInfoResponse* info);
+
+/*
  * VL_WS_getBillingInfoAndPPCBalance - the saved card and the prepaid balance in one answer, each
  * part with its own code and message (a part the answer lacks stays empty). Always the streaming
  * service. The code of the billing part counts.
@@ -240,6 +270,17 @@ VL_WS_Status VL_WS_getPrePaidCardBalance(VL_WS_Handle* handle, VL_WS_PrePaidCard
  */
 VL_WS_Status VL_WS_assignGiftCertificateToUser(VL_WS_Handle* handle, const char* code,
                                                VL_WS_GiftCertificateResponse* answer);
+
+/*
+ * VL_WS_getMyVideos - one page (`currentPageNumber` from 1, `itemsPerPage` titles) of the
+ * account's purchased and rented titles of a purchase type, title type and watch status.
+ *
+ * The handle's access type as it stands (VL_WS_getFileType may have changed it) chooses the
+ * service: DOWNLOAD asks the download service and keeps nothing; any other type asks the
+ * streaming service, whose pages are kept as user data. The code counts.
+ */
+VL_WS_Status VL_WS_getMyVideos(VL_WS_Handle* handle, int currentPageNumber, int itemsPerPage, int purchaseType,
+                               int titleType, int watchStatusFilter, VL_WS_MyVideosResponse* videos);
 
 /*
  * VL_WS_checkRentalExpiration - whether to warn that the rental of pass `passID` runs out, and
@@ -283,6 +324,16 @@ VL_WS_Status VL_WS_getTitleListingPurchaseds(VL_WS_Handle* handle, int count, co
  * the wishlist. The changes below keep the flags up to date, and VL_WS_checkTitleInWishlist
  * answers from them without asking the store.
  * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_getWishlistItems - one page of the wishlist (`currentPageNumber` from 1, `itemsPerPage`
+ * titles of `titleType`) in `sortOrder` (values other than 0 to 3 are sent as 0).
+ *
+ * Kept as user data; a page that comes from the store also sets the flag of every title on it.
+ * The code counts.
+ */
+VL_WS_Status VL_WS_getWishlistItems(VL_WS_Handle* handle, VL_WS_SortOrder sortOrder, int currentPageNumber,
+                                    int itemsPerPage, int titleType, VL_WS_WishlistItemsResponse* items);
 
 /*
  * VL_WS_addItemToWishlist, VL_WS_removeItemFromWishlist, VL_WS_removeAllItemsFromWishlist -

@@ -6,8 +6,7 @@
 const char VLTestAccountClient::kPin[] = "1234";
 
 void VLTestAccountClient::SetUp() {
-  m_Sim.ClearFaults();
-  m_Sim.ClearRequests();
+  VLSimClientTest::SetUp();
   m_Account = m_Sim.Store().AccountForPin(kPin);
   ASSERT_NE(0, m_Account);
   m_Sim.Store().WishlistClear(m_Account);
@@ -19,8 +18,7 @@ void VLTestAccountClient::SetUp() {
 void VLTestAccountClient::TearDown() {
   VL_LogSetObserver(nullptr, nullptr);
   VLWSAELog::InitWSLogs(0, 1, "");
-  VL_WS_release(&m_Handle);
-  m_Sim.ClearFaults();
+  VLSimClientTest::TearDown();
 }
 
 void VLTestAccountClient::Init(VL_WS_AccessType accessType, int cacheData) {
@@ -36,19 +34,10 @@ void VLTestAccountClient::Init(VL_WS_AccessType accessType, int cacheData) {
     params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(cacheData);
   }
   ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
+  // A cache of service answers asks for the catalogue's load time first.
   m_Sim.WaitForRequests(cacheData & VL_WS_CacheParam::CACHE_METADATA ? 1 : 0, 5000);
   m_Sim.ClearRequests();
   m_Log.clear();
-}
-
-void VLTestAccountClient::Fault(const std::string& spec) {
-  std::string error;
-  ASSERT_TRUE(m_Sim.AddFault(spec, &error)) << error;
-}
-
-std::vector<VLSimRequest> VLTestAccountClient::Requests(size_t count) {
-  m_Sim.WaitForRequests(count, 5000);
-  return m_Sim.Requests();
 }
 
 std::vector<std::string> VLTestAccountClient::TakeLog() {
