@@ -12,6 +12,15 @@
 
 namespace {
 
+// Calls an operation that fills a record of type Record and releases the record.
+template <class Record, class Call>
+VL_WS_Status CallAndRelease(Call call) {
+  Record record;
+  VL_WS_Status status = call(&record);
+  VL_WS_release(&record);
+  return status;
+}
+
 class Account : public VLTestAccountClient {
  protected:
   // A user-data entry that shows whether the user data were purged.
@@ -212,6 +221,159 @@ TEST_F(Account, TestOperationsOfTheStreamingService) {
   ASSERT_LE(1u, requests.size());
   EXPECT_EQ("StreamAPI", requests[0].service);
   EXPECT_TRUE(TakeLog().empty());
+}
+
+TEST_F(Account, AccountAnswersAreKeptAsUserData) {
+  Init(STREAM, VL_WS_CacheParam::CACHE_USERDATA);
+  Fault("getEmailAddress=code:1,times=1");
+  VL_WS_EmailAddressResponse email;
+  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getEmailAddress(&m_Handle, &email));
+  VL_WS_release(&email);
+  for (int i = 0; i < 2; ++i) {  // the refused answer was not kept; the next one is
+    ASSERT_EQ(VL_WS_OK, VL_WS_getEmailAddress(&m_Handle, &email));
+    EXPECT_STREQ("alice@example.com", email.EmailAddress);
+    VL_WS_release(&email);
+  }
+  VL_WS_SettingsPageResponse settings;
+  for (int i = 0; i < 2; ++i) {
+    ASSERT_EQ(VL_WS_OK, VL_WS_getSettingsPageInfo(&m_Handle, &settings));
+    EXPECT_STREQ("alice@example.com", settings.Account);
+    EXPECT_STREQ("00-11-22-33-44-55", settings.DeviceID);
+    VL_WS_release(&settings);
+  }
+  EXPECT_EQ(3u, Requests(3).size());
+  EXPECT_EQ((std::vector<std::string>{
+                "VL_WS_getEmailAddress, ret:0,responseCode:1", "VL_WS_getEmailAddress, ret:0,responseCode:0",
+                "VL_WS_getEmailAddress, ret:0,responseCode:0", "VL_WS_getSettingsPageInfo, ret:0,responseCode:0",
+                "VL_WS_getSettingsPageInfo, ret:0,responseCode:0"}),
+            TakeLog());
+
+  // A new authorisation drops them.
+  EXPECT_EQ(VL_WS_OK, CallAndRelease<VL_WS_AuthorizeDeviceResponse>([&](VL_WS_AuthorizeDeviceResponse* r) {
+              return VL_WS_authorizeDevice(&m_Handle, kPinNumber, r);
+            }));
+  ASSERT_EQ(VL_WS_OK, VL_WS_getEmailAddress(&m_Handle, &email));
+  VL_WS_release(&email);
+  EXPECT_EQ(5u, Requests(5).size());
+}
+
+TEST_F(Account, DispatchedOperationsFollowTheAccessTypeOfTheHandle) {
+  // Eighteen operations that both account services offer, each called once.
+  const std::vector<std::pair<const char*, std::function<void(VL_WS_Handle*)>>> operations = {
+      {"authorizeDevice",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_AuthorizeDeviceResponse>(
+             [&](VL_WS_AuthorizeDeviceResponse* r) { return VL_WS_authorizeDevice(h, 9999, r); });
+       }},
+      {"doPurchaseSavedbilling",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_PurchaseResponse>(
+             [&](VL_WS_PurchaseResponse* r) { return VL_WS_doPurchaseSavedBilling(h, 1, "192.0.2.17", false, r); });
+       }},
+      {"checkRentalExpiration",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_RentalExpirationResponse>(
+             [&](VL_WS_RentalExpirationResponse* r) { return VL_WS_checkRentalExpiration(h, 1, r); });
+       }},
+      {"getBillingInfo",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_BillingInfoResponse>(
+             [&](VL_WS_BillingInfoResponse* r) { return VL_WS_getBillingInfo(h, r); });
+       }},
+      {"showPrePaidCardBalance",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_PrePaidCardBalanceResponse>(
+             [&](VL_WS_PrePaidCardBalanceResponse* r) { return VL_WS_getPrePaidCardBalance(h, r); });
+       }},
+      {"getEmailAddress",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_EmailAddressResponse>(
+             [&](VL_WS_EmailAddressResponse* r) { return VL_WS_getEmailAddress(h, r); });
+       }},
+      {"getSettingsPageInfo",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_SettingsPageResponse>(
+             [&](VL_WS_SettingsPageResponse* r) { return VL_WS_getSettingsPageInfo(h, r); });
+       }},
+      {"assignGiftCertificateToUser",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_GiftCertificateResponse>(
+             [&](VL_WS_GiftCertificateResponse* r) { return VL_WS_assignGiftCertificateToUser(h, "GIFT-NONE", r); });
+       }},
+      {"getWishlistItems",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_WishlistItemsResponse>(
+             [&](VL_WS_WishlistItemsResponse* r) { return VL_WS_getWishlistItems(h, VL_WS_SORT_0, 1, 10, 0, r); });
+       }},
+      {"removeItemFromWishList",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_StandardResponse>(
+             [&](VL_WS_StandardResponse* r) { return VL_WS_removeItemFromWishlist(h, 1001, r); });
+       }},
+      {"removeAllItemsFromWishList",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_StandardResponse>(
+             [&](VL_WS_StandardResponse* r) { return VL_WS_removeAllItemsFromWishlist(h, r); });
+       }},
+      {"addItemToWishlist",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_StandardResponse>(
+             [&](VL_WS_StandardResponse* r) { return VL_WS_addItemToWishlist(h, 1001, r); });
+       }},
+      {"checkAdultVerificationEnabled",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_AdultVerificationEnabledResponse>(
+             [&](VL_WS_AdultVerificationEnabledResponse* r) { return VL_WS_checkAdultVerificationEnabled(h, r); });
+       }},
+      {"checkAdultVerificationPin",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_AdultVerificationPinResponse>(
+             [&](VL_WS_AdultVerificationPinResponse* r) { return VL_WS_checkAdultVerificationPin(h, 7, r); });
+       }},
+      {"getConfig",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_ConfigResponse>([&](VL_WS_ConfigResponse* r) { return VL_WS_getConfig(h, r); });
+       }},
+      {"checkAuthToken",
+       [](VL_WS_Handle* h) {
+         bool valid;
+         VL_WS_checkAuthToken(h, &valid);
+       }},
+      {"GetCountryID",
+       [](VL_WS_Handle* h) {
+         int country;
+         VL_WS_getCountryID(h, &country);
+       }},
+      {"deactivateDevice",
+       [](VL_WS_Handle* h) {
+         CallAndRelease<VL_WS_StandardResponse>(
+             [&](VL_WS_StandardResponse* r) { return VL_WS_deactivateDevice(h, r); });
+       }},
+  };
+  struct {
+    VL_WS_AccessType given;
+    int storeType;  // what the store answers to a handle that asks
+    const char* service;
+    const char* settings;
+  } cases[] = {
+      {DOWNLOAD, STREAM, "DownloadAPI", "VL1:DownloadDeviceRequestSettings"},
+      {STREAM, DOWNLOAD, "StreamAPI", "VL1:StreamDeviceRequestSettings"},
+      {UNKNOWN, UNKNOWN, "StreamAPI", "VL1:StreamDeviceRequestSettings"},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.service);
+    m_Sim.Store().SetAccessType(c.storeType);
+    Init(c.given);
+    m_Sim.Store().SetAccessType(STREAM);
+    for (const auto& operation : operations) operation.second(&m_Handle);
+    std::vector<VLSimRequest> requests = Requests(operations.size());
+    ASSERT_EQ(operations.size(), requests.size());
+    for (size_t i = 0; i < operations.size(); ++i) {
+      EXPECT_EQ(operations[i].first, requests[i].operation);
+      EXPECT_EQ(c.service, requests[i].service) << requests[i].operation;
+      EXPECT_EQ(c.settings, requests[i].settingsElement) << requests[i].operation;
+    }
+  }
 }
 
 }  // namespace

@@ -94,9 +94,17 @@ TEST_F(Purchase, RefusedPurchasesHaveTheirOwnStatuses) {
   bool flag = false;
   EXPECT_TRUE(Cache().ReadWishlistFlag(1001, flag));  // a refusal changes nothing
 
-  const std::vector<std::pair<int, VL_WS_Status>> codes = {
-      {1, -1007},  {2, -1008},  {5, -1011},  {11, -1017}, {12, -1018}, {13, VL_WS_E_UNEXPECTED},
-      {19, VL_WS_E_UNEXPECTED}, {20, -1028}, {21, -1021}, {22, -1022}, {23, VL_WS_E_UNEXPECTED}};
+  const std::vector<std::pair<int, VL_WS_Status>> codes = {{1, -1007},
+                                                           {2, -1008},
+                                                           {5, -1011},
+                                                           {11, -1017},
+                                                           {12, -1018},
+                                                           {13, VL_WS_E_UNEXPECTED},
+                                                           {19, VL_WS_E_UNEXPECTED},
+                                                           {20, -1028},
+                                                           {21, -1021},
+                                                           {22, -1022},
+                                                           {23, VL_WS_E_UNEXPECTED}};
   for (const auto& c : codes) {
     SCOPED_TRACE(c.first);
     Fault("doPurchaseSavedbilling=code:" + std::to_string(c.first) + ",times=1");
@@ -117,8 +125,8 @@ TEST_F(Purchase, TaxOfAnOrder) {
   VL_WS_release(&tax);
 
   const std::vector<std::pair<int, VL_WS_Status>> codes = {
-      {1, -1023}, {2, -1024}, {3, -1025}, {4, VL_WS_E_UNEXPECTED}, {11, -1026}, {12, -1027}, {20, -1028},
-      {21, VL_WS_E_UNEXPECTED}};
+      {1, -1023},  {2, -1024},  {3, -1025},  {4, VL_WS_E_UNEXPECTED},
+      {11, -1026}, {12, -1027}, {20, -1028}, {21, VL_WS_E_UNEXPECTED}};
   for (const auto& c : codes) {
     SCOPED_TRACE(c.first);
     Fault("calcOrderTax=code:" + std::to_string(c.first) + ",times=1");
@@ -202,12 +210,12 @@ TEST_F(Purchase, PurchasedTitlesAndRentals) {
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitleListingPurchaseds(&m_Handle, 2, nullptr, &titles));
   VL_WS_release(&titles);
 
-  EXPECT_EQ((std::vector<std::string>{"VL_WS_doPurchaseSavedBilling, ret:0,responseCode:0",
-                                      "VL_WS_checkForPurchasedTitle, result:1", "VL_WS_checkForPurchasedSku, result:1",
-                                      "VL_WS_checkForPurchasedSku, result:0",
-                                      "VL_WS_checkRentalExpiration, ret:0,responseCode:0",
-                                      "VL_WS_checkRentalExpiration, ret:0,responseCode:0"}),
-            TakeLog());
+  EXPECT_EQ(
+      (std::vector<std::string>{
+          "VL_WS_doPurchaseSavedBilling, ret:0,responseCode:0", "VL_WS_checkForPurchasedTitle, result:1",
+          "VL_WS_checkForPurchasedSku, result:1", "VL_WS_checkForPurchasedSku, result:0",
+          "VL_WS_checkRentalExpiration, ret:0,responseCode:0", "VL_WS_checkRentalExpiration, ret:0,responseCode:0"}),
+      TakeLog());
 }
 
 TEST_F(Purchase, PurchasedTitleFollowsTheStoresFileType) {
@@ -248,6 +256,65 @@ TEST_F(Purchase, RemovingAllPurchasesNeedsThePassword) {
   bool purchased = true;
   EXPECT_EQ(VL_WS_OK, VL_WS_checkForPurchasedSku(&m_Handle, kBuySku, &purchased));
   EXPECT_FALSE(purchased);
+}
+
+TEST_F(Purchase, BillingInfoIsKeptAndHasItsOwnStatuses) {
+  Init(STREAM, VL_WS_CacheParam::CACHE_USERDATA);
+  const std::vector<std::pair<int, VL_WS_Status>> codes = {
+      {1, -1008}, {2, -1017}, {3, -1011}, {4, -1012}, {5, VL_WS_E_UNEXPECTED}};
+  VL_WS_BillingInfoResponse info;
+  for (const auto& c : codes) {
+    SCOPED_TRACE(c.first);
+    Fault("getBillingInfo=code:" + std::to_string(c.first) + ",times=1");
+    EXPECT_EQ(c.second, VL_WS_getBillingInfo(&m_Handle, &info));
+    EXPECT_EQ(c.first, info.ResponseCode);
+    VL_WS_release(&info);
+  }
+  for (int i = 0; i < 2; ++i) {
+    ASSERT_EQ(VL_WS_OK, VL_WS_getBillingInfo(&m_Handle, &info));
+    EXPECT_STREQ("4242", info.CCLastFour);
+    EXPECT_STREQ("Visa", info.CCType);
+    VL_WS_release(&info);
+  }
+  EXPECT_EQ(codes.size() + 1, Requests(codes.size() + 1).size());
+}
+
+TEST_F(Purchase, MyVideosAreKeptOnlyFromTheStreamingService) {
+  Init(STREAM, 7);
+  const int pass = Buy(kRentalSku);
+  Buy(kBuySku);
+  VL_WS_MyVideosResponse videos;
+  for (int i = 0; i < 2; ++i) {
+    ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 0, 0, 3, &videos));  // rentals, any watch status
+    ASSERT_EQ(1, videos.Titles.Count);
+    EXPECT_EQ(pass, videos.Titles.Items[0].PassID);
+    EXPECT_EQ(1002, videos.Titles.Items[0].TitleID);
+    EXPECT_EQ(1, videos.TotalItems);
+    VL_WS_release(&videos);
+  }
+  ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 1, 0, 3, &videos));  // another purchase type asks
+  ASSERT_EQ(1, videos.Titles.Count);
+  EXPECT_EQ(1001, videos.Titles.Items[0].TitleID);
+  VL_WS_release(&videos);
+  std::vector<VLSimRequest> requests = Requests(4);
+  ASSERT_EQ(4u, requests.size());
+  EXPECT_EQ("getMyStreamingVideos", requests[2].operation);
+  EXPECT_EQ("getMyStreamingVideos", requests[3].operation);
+
+  Init(DOWNLOAD, 7);
+  for (int i = 0; i < 2; ++i) {
+    ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 0, 0, 3, &videos));
+    EXPECT_EQ(1, videos.Titles.Count);
+    VL_WS_release(&videos);
+  }
+  requests = Requests(2);
+  ASSERT_EQ(2u, requests.size());
+  for (const VLSimRequest& request : requests) {
+    EXPECT_EQ("DownloadAPI", request.service);
+    EXPECT_EQ("getMyVideos", request.operation);
+  }
+  VLString value;
+  EXPECT_FALSE(Cache().ReadUserData("getMyVideos", "1,10,0,0,3", value));
 }
 
 }  // namespace
