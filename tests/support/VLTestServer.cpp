@@ -13,62 +13,27 @@
 #include <chrono>
 
 #include <openssl/err.h>
-#include <openssl/pem.h>
 #include <openssl/ssl.h>
-#include <openssl/x509v3.h>
 
+#include "VLSimServer.h"
 #include "VLSoapTransport.h"
 #include "VLStoreHosts.h"
 
-namespace {
-
-EVP_PKEY* NewKey() { return EVP_EC_gen("P-256"); }
-
-void AddExt(X509* cert, X509* issuer, int nid, const char* value) {
-  X509V3_CTX ctx;
-  X509V3_set_ctx_nodb(&ctx);
-  X509V3_set_ctx(&ctx, issuer, cert, NULL, NULL, 0);
-  X509_EXTENSION* ext = X509V3_EXT_conf_nid(NULL, &ctx, nid, value);
-  X509_add_ext(cert, ext, -1);
-  X509_EXTENSION_free(ext);
-}
-
-// A certificate for key with common name cn, signed by issuer (itself when null).
-VLTestPKI::Cert MakeCert(const char* cn, const char* san, bool ca, const VLTestPKI::Cert* issuer) {
-  static long serial = 1;
-  VLTestPKI::Cert c = {X509_new(), NewKey()};
-  X509_set_version(c.cert, 2);
-  ASN1_INTEGER_set(X509_get_serialNumber(c.cert), serial++);
-  X509_gmtime_adj(X509_getm_notBefore(c.cert), -3600);
-  X509_gmtime_adj(X509_getm_notAfter(c.cert), 86400);
-  X509_set_pubkey(c.cert, c.key);
-  X509_NAME* name = X509_get_subject_name(c.cert);
-  X509_NAME_add_entry_by_txt(name, "O", MBSTRING_ASC, reinterpret_cast<const unsigned char*>("VL Test"), -1, -1, 0);
-  X509_NAME_add_entry_by_txt(name, "CN", MBSTRING_ASC, reinterpret_cast<const unsigned char*>(cn), -1, -1, 0);
-  X509* issuerCert = issuer ? issuer->cert : c.cert;
-  X509_set_issuer_name(c.cert, X509_get_subject_name(issuerCert));
-  AddExt(c.cert, issuerCert, NID_basic_constraints, ca ? "critical,CA:TRUE" : "CA:FALSE");
-  AddExt(c.cert, issuerCert, NID_key_usage, ca ? "critical,keyCertSign,cRLSign" : "critical,digitalSignature");
-  AddExt(c.cert, issuerCert, NID_subject_key_identifier, "hash");
-  if (san) AddExt(c.cert, issuerCert, NID_subject_alt_name, san);
-  X509_sign(c.cert, issuer ? issuer->key : c.key, EVP_sha256());
-  return c;
-}
-
-const char kServerNames[] = "DNS:localhost,IP:127.0.0.1,DNS:" VL_STORE_PRODUCTION_HOST;
-
-}  // namespace
-
 VLTestPKI::VLTestPKI() {
-  m_CA = MakeCert("VL Test Root CA", NULL, true, NULL);
-  m_Trusted = MakeCert("VL Loopback Test Server", kServerNames, false, &m_CA);
-  m_SelfSigned = MakeCert("VL Self-signed Test Server", kServerNames, false, NULL);
-  m_OtherHost = MakeCert("VL Other Test Server", "DNS:other.ostrel.example", false, &m_CA);
+  std::vector<std::string> names = {"localhost", "127.0.0.1"};
+  for (const char* const* host = VLSimServer::Hosts(); *host; ++host) names.push_back(*host);
+  std::string error;
+  if (!m_Certificates.Create(names, &error)) abort();
+  m_CA = {m_Certificates.CACertificate(), nullptr};
+  m_Trusted = {m_Certificates.Certificate(VLSimCertificates::kGood), m_Certificates.PrivateKey(VLSimCertificates::kGood)};
+  m_SelfSigned = {m_Certificates.Certificate(VLSimCertificates::kSelfSigned),
+                  m_Certificates.PrivateKey(VLSimCertificates::kSelfSigned)};
+  m_OtherHost = {m_Certificates.Certificate(VLSimCertificates::kWrongHost),
+                 m_Certificates.PrivateKey(VLSimCertificates::kWrongHost)};
   char path[] = "/tmp/vl-test-ca-XXXXXX";
   int fd = mkstemp(path);
-  FILE* f = fdopen(fd, "w");
-  PEM_write_X509(f, m_CA.cert);
-  fclose(f);
+  close(fd);
+  if (!m_Certificates.WriteCA(path, &error)) abort();
   m_CAFile = path;
   setenv("SSL_CERT_FILE", path, 1);
 }

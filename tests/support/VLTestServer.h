@@ -4,6 +4,8 @@
 #ifndef VLTESTSERVER_H
 #define VLTESTSERVER_H
 
+#include "VLSimCertificates.h"
+
 #include <openssl/evp.h>
 #include <openssl/x509.h>
 
@@ -14,10 +16,10 @@
 #include <thread>
 #include <vector>
 
-// Certificates for the loopback servers, made once per process. The CA is written to a PEM file
-// and named in SSL_CERT_FILE, which the library's TLS set-up reads (OpenSSL's default verify
-// paths), so Trusted() verifies. Common names never match a host name: the checks must pass or
-// fail on the subjectAltNames.
+// Certificates for the loopback servers, made once per process by the store simulator's PKI
+// (simulator/VLSimCertificates.h). The CA is written to a PEM file and named in SSL_CERT_FILE,
+// which the library's TLS set-up reads (OpenSSL's default verify paths), so Trusted() verifies.
+// Common names never match a host name: the checks must pass or fail on the subjectAltNames.
 class VLTestPKI {
  public:
   struct Cert {
@@ -26,15 +28,16 @@ class VLTestPKI {
   };
   static VLTestPKI& Get();
 
-  // Signed by the test CA for localhost, 127.0.0.1 and the store's production host.
+  // Signed by the test CA for localhost, 127.0.0.1 and every store host.
   const Cert& Trusted() const { return m_Trusted; }
   // Self-signed, for the same names.
   const Cert& SelfSigned() const { return m_SelfSigned; }
-  // Signed by the test CA for another host only ("other.ostrel.example").
+  // Signed by the test CA for another host only ("wrong-host.invalid").
   const Cert& OtherHost() const { return m_OtherHost; }
 
  private:
   VLTestPKI();
+  VLSimCertificates m_Certificates;
   Cert m_CA, m_Trusted, m_SelfSigned, m_OtherHost;
   std::string m_CAFile;
 };
