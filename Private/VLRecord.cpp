@@ -1,6 +1,8 @@
 // Tagging of the records nested in client records.
 #include "VLRecord.h"
 
+#include "VLUtilities.h"
+
 void VLRecordInitNested(const void* record) {}
 
 void VLRecordInitNested(VL_WS_ProductListing* record) {
@@ -24,4 +26,9 @@ void VLRecordInitNested(VL_WS_MyVideosResponse* record) { VLRecordInit(record->T
 void VLRecordInitNested(VL_WS_BillingInfoAndPPCBalance* record) {
   VLRecordInit(record->BillingInfo);
   VLRecordInit(record->PPCardBalance);
+}
+
+void VLRecordSetString(VL_WS_String& record, const char* text) {
+  record.Text = VLUtilities::StrDup(text);
+  record.Length = static_cast<int>(strlen(record.Text));
 }

@@ -102,6 +102,10 @@ Record& VLRecordInit(Record& record) {
   return record;
 }
 
+// Fills a string record prepared with VLRecordInit with an owned copy of text (an empty one for
+// null) and its length.
+void VLRecordSetString(VL_WS_String& record, const char* text);
+
 // Gives an empty array record `count` cleared and tagged elements (nothing for a count below 1).
 template <class Array>
 void VLRecordNewItems(Array& array, int count) {

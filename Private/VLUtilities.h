@@ -9,6 +9,8 @@
 #include "VLString.h"
 #include "VL_WS_Records.h"
 
+struct soap;
+
 // Schema records of the store's answers (generated from soap/VL.h.in).
 class VL1__ArrayOfGenre;
 class VL1__ArrayOfGetTitlesResponse;
@@ -133,6 +135,17 @@ class VLUtilities {
                                          VL_WS_BoxArtSize size);
 
   // ---- Endpoint query (VLUtilities_Endpoint.cpp) ----------------------------------------------
+
+  // The base URL of the store's services (https, ending in "/") for a content type (ADULT, or
+  // general for any other value) and an environment number. Environments 0 to 2 come from the
+  // endpoint table and set envID to that number. Any other number asks the store's
+  // device-environment service over the context's transport (its TLS context must be set up):
+  // envID becomes the digit it answered, or 2 (production) for an answer that is not
+  // "HTTP/1.1 200 OK" with "Content-Length: 1" and one digit, a failed exchange included. Returns
+  // the empty text, envID unchanged, when the service could not be connected to.
+  static const char* QueryServiceBaseURL(enum VL_WS_SetupParams::ContentType contentType, soap* context,
+                                         const char* destinationUniqueID, int destinationTypeID,
+                                         VL_WS_EnvNum envNum, VL_WS_EnvID& envID);
 };
 
 #endif  // VLUTILITIES_H

@@ -21,6 +21,16 @@ struct VL_WS_Client {
   CacheInterface* m_Cache = nullptr;      // null when the handle has no cache
 };
 
+// The client state of a handle: null for a null handle and for a handle without client state,
+// which every operation refuses with -1000.
+VL_WS_Client* VLClientOf(const VL_WS_Handle* handle);
+
+// Ends one SOAP call on a service context: deletes the call's request and response records and
+// everything else the call allocated in the context (the reply's header and texts included) and
+// ends the context's message state. Nothing of the reply may be used afterwards. Every
+// operation runs it once per call, whatever the call's outcome.
+void VLEndCall(soap& context);
+
 // Frees a handle's client state: closes and deletes its cache, then destroys its settings, the
 // dispatcher and the three service objects. VL_WS_release calls it for a handle that has one.
 void VLClientRelease(VL_WS_Client* client);

@@ -1,0 +1,634 @@
+// Client handles against the store simulator: validation, environments and endpoints, the
+// device-environment service, access type, User-Agent, the cache file and its refresh, and
+// duplicates.
+#include <gtest/gtest.h>
+#include <string.h>
+#include <sys/stat.h>
+
+#include <string>
+#include <vector>
+
+#include "CacheInterface.h"
+#include "VLFile.h"
+#include "VLTestDir.h"
+#include "VLTestSimulator.h"
+#include "VLUtilities.h"
+#include "VL_WS.h"
+#include "VL_WS_Client.h"
+
+namespace {
+
+const char kDevice[] = "00-11-22-33-44-55";
+
+class Client : public testing::Test {
+ protected:
+  void SetUp() override {
+    m_Sim.ClearFaults();
+    m_Sim.ClearRequests();
+  }
+  void TearDown() override {
+    VL_WS_release(&m_Handle);
+    m_Sim.ClearFaults();
+    m_Sim.Store().SetDeviceEnv(kDevice, 2);
+    m_Sim.Store().SetAccessType(STREAM);
+  }
+
+  void Fault(const std::string& spec) {
+    std::string error;
+    ASSERT_TRUE(m_Sim.AddFault(spec, &error)) << error;
+  }
+  // Initialises m_Handle (released first).
+  VL_WS_Status Init(const VL_WS_SetupParams& params) {
+    VL_WS_release(&m_Handle);
+    return VL_WS_initialize(&m_Handle, &params);
+  }
+  VL_WS_SetupParams2& Settings() { return m_Handle.client->m_Params; }
+  // The requests of the log whose path starts with path.
+  std::vector<VLSimRequest> RequestsTo(const std::string& path) {
+    std::vector<VLSimRequest> found;
+    for (const VLSimRequest& r : m_Sim.Requests())
+      if (r.path.compare(0, path.size(), path) == 0) found.push_back(r);
+    return found;
+  }
+  // A setup record with a file cache of all kinds in folder.
+  static VL_WS_SetupParams FileCache(const std::string& folder) {
+    VL_WS_SetupParams params = VLTestSetupParams();
+    params.CacheType = 2;
+    params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+    params.CachePath = folder.c_str();
+    return params;
+  }
+  static bool IsEmpty(const VL_WS_Handle& handle) { return handle.tag == nullptr && handle.client == nullptr; }
+
+  VLSimServer& m_Sim = VLTestSimulator();
+  VL_WS_Handle m_Handle = {};
+};
+
+TEST_F(Client, FixedEnvironmentsTakeTheirEndpointWithoutAsking) {
+  struct {
+    enum VL_WS_SetupParams::ContentType content;
+    VL_WS_EnvNum env;
+    const char* host;
+    const char* path;
+  } cases[] = {
+      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_STGAPI, "stgapi.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_STG, "stg.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_PRODUCTION, "store.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_STGAPI, "stgapi.ostrel.example", "/aac/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_STG, "stg.adult.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_PRODUCTION, "adult.ostrel.example", "/api/"},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(std::string(c.host) + c.path);
+    m_Sim.ClearRequests();
+    VL_WS_SetupParams params = VLTestSetupParams();
+    params.ContentType = c.content;
+    params.EnvNum = c.env;
+    params.AccessType = UNKNOWN;  // the file type question shows where requests go
+    testing::internal::CaptureStdout();
+    ASSERT_EQ(VL_WS_OK, Init(params));
+    std::string printed = testing::internal::GetCapturedStdout();
+    std::string base = std::string("https://") + c.host + c.path;
+    EXPECT_EQ(base, Settings().ServiceBaseURL.c_str());
+    EXPECT_EQ("\n=======>Content type:" + std::to_string(c.content) + ", envID:" + std::to_string(c.env) +
+                  ", endpoint URL:" + base + "\n",
+              printed);
+    VL_WS_EnvID env = -1;
+    EXPECT_EQ(VL_WS_OK, VL_WS_getDeviceEnv(&m_Handle, &env));
+    EXPECT_EQ(c.env, env);
+    std::vector<VLSimRequest> requests = m_Sim.Requests();
+    ASSERT_EQ(1u, requests.size());
+    EXPECT_EQ("getFileType", requests[0].operation);
+    EXPECT_EQ(c.host, requests[0].host);
+    EXPECT_EQ(std::string(c.path) + "RealTimeBrowse.asmx", requests[0].path);
+  }
+}
+
+TEST_F(Client, DefaultEnvironmentIsTheDigitTheDeviceEnvironmentServiceAnswers) {
+  struct {
+    enum VL_WS_SetupParams::ContentType content;
+    int digit;
+    const char* base;
+  } cases[] = {
+      {VL_WS_SetupParams::GENERAL, 0, "https://stgapi.ostrel.example/api/"},
+      {VL_WS_SetupParams::GENERAL, 1, "https://stg.ostrel.example/api/"},
+      {VL_WS_SetupParams::GENERAL, 7, "https://store.ostrel.example/api/"},
+      {VL_WS_SetupParams::ADULT, 0, "https://stgapi.ostrel.example/aac/api/"},
+      {VL_WS_SetupParams::ADULT, 1, "https://stg.adult.ostrel.example/api/"},
+      {VL_WS_SetupParams::ADULT, 2, "https://adult.ostrel.example/api/"},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.base);
+    m_Sim.ClearRequests();
+    m_Sim.Store().SetDeviceEnv(kDevice, c.digit);
+    VL_WS_SetupParams params = VLTestSetupParams();
+    params.ContentType = c.content;
+    params.EnvNum = c.digit == 7 ? static_cast<VL_WS_EnvNum>(9) : VL_WS_ENV_DEFAULT;  // 3 and above ask
+    testing::internal::CaptureStdout();
+    ASSERT_EQ(VL_WS_OK, Init(params));
+    EXPECT_EQ(std::string("\n---> End-Point URL: ") + c.base + " <---\n\n", testing::internal::GetCapturedStdout());
+    EXPECT_EQ(c.base, Settings().ServiceBaseURL);
+    EXPECT_EQ(c.digit, Settings().EnvID);
+    std::vector<VLSimRequest> asked = RequestsTo("/device/env/");
+    ASSERT_EQ(1u, asked.size());
+    EXPECT_TRUE(asked[0].tls);
+    EXPECT_EQ("store.ostrel.example", asked[0].host);
+    EXPECT_EQ("d=00-11-22-33-44-55&dt=7", asked[0].query);
+    EXPECT_EQ("DUDUVud", asked[0].userAgent);
+  }
+}
+
+TEST_F(Client, DeviceIdentifierIsSentUrlEncoded) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.DestinationUniqueID = "box 1/a&b";
+  params.DestinationTypeID = -3;
+  params.EnvNum = VL_WS_ENV_DEFAULT;
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  std::vector<VLSimRequest> asked = RequestsTo("/device/env/");
+  ASSERT_EQ(1u, asked.size());
+  EXPECT_EQ("d=box%201%2Fa%26b&dt=-3", asked[0].query);
+}
+
+TEST_F(Client, UnreadableEnvironmentAnswersSelectProduction) {
+  m_Sim.Store().SetDeviceEnv(kDevice, 1);
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.EnvNum = VL_WS_ENV_DEFAULT;
+  // No "Content-Length: 1", another status, no answer at all.
+  for (const char* fault : {"badlength:1", "status:503", "close"}) {
+    SCOPED_TRACE(fault);
+    Fault(std::string("/device/env/=") + fault + ",times=1");
+    ASSERT_EQ(VL_WS_OK, Init(params));
+    EXPECT_EQ(2, Settings().EnvID);
+    EXPECT_EQ("https://store.ostrel.example/api/", Settings().ServiceBaseURL);
+  }
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(1, Settings().EnvID);
+}
+
+TEST_F(Client, UnreachableEnvironmentServiceFailsInitialisation) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.EnvNum = VL_WS_ENV_DEFAULT;
+  Fault("store.ostrel.example=tls:selfsigned,times=1");
+  EXPECT_EQ(VL_WS_E_CONNECT, Init(params));
+  EXPECT_TRUE(IsEmpty(m_Handle));
+}
+
+TEST_F(Client, DefaultEnvIdAsksWithoutChangingTheHandle) {
+  m_Sim.Store().SetDeviceEnv(kDevice, 1);
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams()));
+  VL_WS_EnvID env = -1;
+  EXPECT_EQ(VL_WS_OK, VL_WS_getDefaultEnvID(&m_Handle, &env));
+  EXPECT_EQ(1, env);
+  EXPECT_EQ(2, Settings().EnvID);
+  EXPECT_EQ("https://store.ostrel.example/api/", Settings().ServiceBaseURL);
+
+  Fault("store.ostrel.example=tls:selfsigned,times=1");
+  env = -1;
+  EXPECT_EQ(VL_WS_E_NETWORK, VL_WS_getDefaultEnvID(&m_Handle, &env));
+  EXPECT_EQ(-1, env);
+
+  VL_WS_Handle empty = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getDefaultEnvID(&empty, &env));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getDeviceEnv(&empty, &env));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getDeviceEnv(nullptr, &env));
+}
+
+TEST_F(Client, InvalidSetupIsRefusedBeforeAnythingElse) {
+  std::string longId(351, 'x');
+  VL_WS_SetupParams base = VLTestSetupParams();
+  std::vector<std::pair<const char*, VL_WS_SetupParams>> cases;
+  auto add = [&](const char* name, void (*change)(VL_WS_SetupParams&)) {
+    VL_WS_SetupParams p = base;
+    change(p);
+    cases.push_back({name, p});
+  };
+  add("no key", [](VL_WS_SetupParams& p) { p.APIKey = nullptr; });
+  add("empty key", [](VL_WS_SetupParams& p) { p.APIKey = ""; });
+  add("no device", [](VL_WS_SetupParams& p) { p.DestinationUniqueID = nullptr; });
+  add("empty device", [](VL_WS_SetupParams& p) { p.DestinationUniqueID = ""; });
+  add("no user", [](VL_WS_SetupParams& p) { p.UserName = nullptr; });
+  add("empty user", [](VL_WS_SetupParams& p) { p.UserName = ""; });
+  add("no password", [](VL_WS_SetupParams& p) { p.Password = nullptr; });
+  add("empty password", [](VL_WS_SetupParams& p) { p.Password = ""; });
+  add("file cache without path", [](VL_WS_SetupParams& p) { p.CacheType = 2; });
+  add("limit below 350 KiB", [](VL_WS_SetupParams& p) {
+    p.CacheType = 1;
+    p.CacheLimit = 358399;
+  });
+  add("content type 2", [](VL_WS_SetupParams& p) { p.ContentType = static_cast<enum VL_WS_SetupParams::ContentType>(2); });
+  add("cache type 3", [](VL_WS_SetupParams& p) { p.CacheType = 3; });
+  add("environment -1", [](VL_WS_SetupParams& p) { p.EnvNum = static_cast<VL_WS_EnvNum>(-1); });
+  VL_WS_SetupParams tooLong = base;
+  tooLong.DestinationUniqueID = longId.c_str();
+  cases.push_back({"device of 351 bytes", tooLong});
+
+  // Validation comes before the cache folder (one that cannot be made) and the environment
+  // service (which would be asked).
+  VLTestDir dir;
+  ASSERT_TRUE(VLWriteFile(dir / "file", "x"));
+  std::string underFile = dir / "file/cache";
+  for (auto& c : cases) {
+    SCOPED_TRACE(c.first);
+    if (c.second.EnvNum == VL_WS_ENV_PRODUCTION) c.second.EnvNum = VL_WS_ENV_DEFAULT;
+    if (c.second.CacheType == 0) {
+      c.second.CacheType = 2;
+      c.second.CachePath = underFile.c_str();
+    }
+    EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Init(c.second));
+    EXPECT_TRUE(IsEmpty(m_Handle));
+  }
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_initialize(&m_Handle, nullptr));
+  EXPECT_TRUE(IsEmpty(m_Handle));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_initialize(nullptr, &base));
+  EXPECT_TRUE(m_Sim.Requests().empty());
+}
+
+TEST_F(Client, CacheFolderComesBeforeTheEnvironmentServiceAndTheCache) {
+  VLTestDir dir;
+  ASSERT_TRUE(VLWriteFile(dir / "file", "x"));
+  std::string underFile = dir / "file/cache";
+  VL_WS_SetupParams params = FileCache(underFile);
+  params.EnvNum = VL_WS_ENV_DEFAULT;
+  Fault("store.ostrel.example=tls:selfsigned,times=1");
+  EXPECT_EQ(VL_WS_E_CACHE_FOLDER, Init(params));
+  EXPECT_TRUE(IsEmpty(m_Handle));
+  EXPECT_TRUE(m_Sim.Requests().empty());
+
+  // A missing folder is made, with its parents.
+  std::string nested = dir / "a/b/c";
+  params.CachePath = nested.c_str();
+  EXPECT_EQ(VL_WS_E_CONNECT, Init(params));  // the fault is still there
+  EXPECT_TRUE(VLFile::FolderExist(nested.c_str()));
+  EXPECT_EQ(VL_WS_OK, Init(params));
+}
+
+TEST_F(Client, CacheLimitIsCheckedOnlyWithACache) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.CacheLimit = 1;
+  EXPECT_EQ(VL_WS_OK, Init(params));
+  params.CacheType = 1;
+  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+  params.CacheLimit = 358400;
+  EXPECT_EQ(VL_WS_OK, Init(params));
+  params.CacheLimit = 0;
+  EXPECT_EQ(VL_WS_OK, Init(params));
+  std::string longestId(350, 'x');
+  params.DestinationUniqueID = longestId.c_str();
+  EXPECT_EQ(VL_WS_OK, Init(params));
+}
+
+TEST_F(Client, SettingsAreTheHandlesOwnCopy) {
+  std::string key = VLTestSetupParams().APIKey, token = "token-1", proxyUser = "pu";
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.APIKey = key.c_str();
+  params.AuthToken = token.c_str();
+  params.ProxyHost = "";  // an empty proxy host takes none of the proxy fields
+  params.ProxyPort = 3128;
+  params.ProxyUserName = proxyUser.c_str();
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  key.assign(key.size(), '#');
+  token.assign(token.size(), '#');
+  EXPECT_EQ(VLTestSetupParams().APIKey, Settings().APIKey);
+  EXPECT_EQ("token-1", Settings().AuthToken);
+  EXPECT_EQ(30, Settings().SendTimeout);
+  EXPECT_EQ(88, Settings().RecvTimeout);
+  EXPECT_EQ(STREAM, Settings().AccessType);
+  EXPECT_TRUE(Settings().ProxyHost.empty());
+  EXPECT_EQ(0, Settings().ProxyPort);
+  EXPECT_TRUE(Settings().ProxyUserName.empty());
+  EXPECT_TRUE(Settings().CacheParam.CachePath.empty());
+  EXPECT_EQ(nullptr, m_Handle.client->m_Cache);
+
+  params.ProxyHost = "proxy.example";
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ("proxy.example", Settings().ProxyHost);
+  EXPECT_EQ(3128, Settings().ProxyPort);
+  EXPECT_EQ("pu", Settings().ProxyUserName);
+  EXPECT_TRUE(Settings().ProxyPassword.empty());
+}
+
+TEST_F(Client, UserAgentTellsFirmwareRevisionAndModel) {
+  struct {
+    const char* firmware;
+    const char* revision;
+    const char* model;
+    const char* userAgent;  // the handle's text; the store's HTTP parser drops a leading blank
+  } cases[] = {
+      {"fw1", "r2", "M3", "VLSDK: fw1|r2 VLMODEL:M3"},
+      {"fw1", nullptr, nullptr, "VLSDK: fw1|"},
+      {"", "r2", "", "VLSDK: |r2"},
+      {nullptr, nullptr, "M3", " VLMODEL:M3"},
+      {nullptr, "", nullptr, ""},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.userAgent);
+    m_Sim.ClearRequests();
+    VL_WS_SetupParams params = VLTestSetupParams();
+    params.firmwareVersion = c.firmware;
+    params.ApplicationRevision = c.revision;
+    params.modelNumber = c.model;
+    params.AccessType = UNKNOWN;
+    testing::internal::CaptureStdout();
+    ASSERT_EQ(VL_WS_OK, Init(params));
+    std::string printed = testing::internal::GetCapturedStdout();
+    EXPECT_EQ(c.userAgent, Settings().UserAgent);
+    std::string expected = "\n=======>Content type:0, envID:2, endpoint URL:https://store.ostrel.example/api/\n";
+    if (*c.userAgent) expected += std::string("\n***---> User-Agent = ") + c.userAgent;
+    EXPECT_EQ(expected, printed);
+    ASSERT_EQ(1u, m_Sim.Requests().size());
+    std::string sent = *c.userAgent ? std::string(c.userAgent + (*c.userAgent == ' ')) : "gSOAP/2.7";
+    EXPECT_EQ(sent, m_Sim.Requests()[0].userAgent);
+  }
+}
+
+TEST_F(Client, UnknownAccessTypeIsAskedOfTheStore) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.AccessType = UNKNOWN;
+  m_Sim.Store().SetAccessType(DOWNLOAD);
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(DOWNLOAD, Settings().AccessType);
+  EXPECT_EQ(static_cast<soap*>(&m_Handle.client->m_DownloadAPI), &static_cast<soap&>(m_Handle.client->m_StreamDownloadAPI));
+  ASSERT_EQ(1u, m_Sim.Requests().size());
+  EXPECT_EQ("RealTimeBrowse", m_Sim.Requests()[0].service);
+  EXPECT_EQ("VL1:DeviceSettings", m_Sim.Requests()[0].settingsElement);
+
+  // Any value but DOWNLOAD and STREAM asks.
+  m_Sim.Store().SetAccessType(STREAM);
+  params.AccessType = static_cast<VL_WS_AccessType>(7);
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(STREAM, Settings().AccessType);
+
+  // A failed question leaves UNKNOWN, which routes account operations to the streaming service.
+  m_Sim.Store().SetAccessType(DOWNLOAD);
+  Fault("getFileType=close,times=1");
+  params.AccessType = UNKNOWN;
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(UNKNOWN, Settings().AccessType);
+  EXPECT_EQ(static_cast<soap*>(&m_Handle.client->m_StreamAPI), &static_cast<soap&>(m_Handle.client->m_StreamDownloadAPI));
+
+  // A given access type is kept without asking.
+  m_Sim.ClearRequests();
+  params.AccessType = DOWNLOAD;
+  m_Sim.Store().SetAccessType(STREAM);
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(DOWNLOAD, Settings().AccessType);
+  EXPECT_TRUE(m_Sim.Requests().empty());
+}
+
+TEST_F(Client, FileTypeRewritesTheAccessTypeButNotTheRouting) {
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams()));
+  m_Sim.Store().SetAccessType(DOWNLOAD);
+  VL_WS_FileType type;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getFileType(&m_Handle, &type));
+  ASSERT_NE(nullptr, type.tag);
+  EXPECT_EQ(VL_WS_TAG_FILE_TYPE, *type.tag);
+  EXPECT_EQ(DOWNLOAD, type.File_AccessType);
+  EXPECT_EQ(DOWNLOAD, Settings().AccessType);
+  EXPECT_EQ(static_cast<soap*>(&m_Handle.client->m_StreamAPI), &static_cast<soap&>(m_Handle.client->m_StreamDownloadAPI));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&type));
+
+  // A failure leaves the access type and gives a tagged, empty record.
+  Fault("getFileType=soapfault:server,times=1");
+  EXPECT_EQ(VL_WS_E_SOAP_FAULT(2), VL_WS_getFileType(&m_Handle, &type));
+  EXPECT_EQ(VL_WS_TAG_FILE_TYPE, *type.tag);
+  EXPECT_EQ(0, type.File_AccessType);
+  EXPECT_EQ(DOWNLOAD, Settings().AccessType);
+  VL_WS_release(&type);
+
+  VL_WS_Handle empty = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getFileType(&empty, &type));
+  EXPECT_EQ(VL_WS_TAG_FILE_TYPE, *type.tag);
+  VL_WS_release(&type);
+}
+
+TEST_F(Client, CacheFileNameTellsDevicesKeysAccountsAndSettingsApart) {
+  VLTestDir dir;
+  VL_WS_SetupParams params = FileCache(dir.path());
+  params.CacheLimit = 400000;
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  auto hash = [](const char* s) { return std::to_string(VLUtilities::Hash(0, s, static_cast<unsigned>(strlen(s)))); };
+  std::string name = "0_" + hash(params.DestinationUniqueID) + "_7_" + hash(params.APIKey) + "_" + hash(params.UserName) +
+                     "_" + hash(params.Password) + "_7_400000_1.vl";
+  EXPECT_EQ(dir / name, Settings().CacheParam.CachePath.c_str());
+  EXPECT_TRUE(VLFile::Exist((dir / name).c_str()));
+  std::string first = Settings().CacheParam.CachePath.c_str();
+
+  // Only the password differs: another file in the same folder.
+  params.Password = "other-password";
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  std::string second = Settings().CacheParam.CachePath.c_str();
+  EXPECT_NE(first, second);
+  EXPECT_EQ(dir.path(), VLFile::GetFolderName(second.c_str()).c_str());
+  EXPECT_TRUE(VLFile::Exist(first.c_str()));
+  EXPECT_TRUE(VLFile::Exist(second.c_str()));
+
+  // A folder without its separator gets one; the empty folder is the current one.
+  std::string bare = dir.path().substr(0, dir.path().size() - 1);
+  params.CachePath = bare.c_str();
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(second, Settings().CacheParam.CachePath.c_str());
+  {
+    VLScopedCurrentDir here(dir.path());
+    params.CachePath = "";
+    ASSERT_EQ(VL_WS_OK, Init(params));
+    EXPECT_EQ("./" + VLFile::GetFileName(second.c_str()), Settings().CacheParam.CachePath.c_str());
+    VL_WS_release(&m_Handle);
+  }
+}
+
+TEST_F(Client, DamagedCacheFileIsReplacedAndAnUnopenableOneFails) {
+  VLTestDir dir;
+  VL_WS_SetupParams params = FileCache(dir.path());
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  std::string path = Settings().CacheParam.CachePath.c_str();
+  VL_WS_release(&m_Handle);
+
+  ASSERT_TRUE(VLWriteFile(path, std::string(4096, 'x')));
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(0u, VLReadFile(path).find("SQLite format 3"));
+  EXPECT_TRUE(m_Handle.client->m_Cache->WriteMetaData("n", "k", "v"));
+  VL_WS_release(&m_Handle);
+
+  // A folder in the file's place cannot be opened nor deleted.
+  ASSERT_TRUE(VLFile::Remove(path.c_str()));
+  ASSERT_EQ(0, mkdir(path.c_str(), 0755));
+  ASSERT_TRUE(VLWriteFile(path + "/keep", "x"));
+  EXPECT_EQ(VL_WS_E_CACHE_OPEN, Init(params));
+  EXPECT_TRUE(IsEmpty(m_Handle));
+}
+
+TEST_F(Client, InitialisationRefreshesMetadataAndPurgesUserData) {
+  VLTestDir dir;
+  VL_WS_SetupParams params = FileCache(dir.path());
+  const std::string loaded = m_Sim.Store().LastCacheLoadTime();
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(1u, RequestsTo("/api/RealTimeBrowse.asmx").size());
+  EXPECT_EQ("getLastCacheLoadTimeUTC", m_Sim.Requests().back().operation);
+  CacheInterface* cache = m_Handle.client->m_Cache;
+  ASSERT_TRUE(cache->WriteMetaData("getNavigation", "", "answer"));
+  ASSERT_TRUE(cache->WriteWishlistFlag(1001, true));
+
+  // The same catalogue: the answers stay, the user data go.
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  cache = m_Handle.client->m_Cache;
+  VLString value;
+  bool flag = false;
+  EXPECT_TRUE(cache->ReadMetaData("getNavigation", "", value));
+  EXPECT_FALSE(cache->ReadWishlistFlag(1001, flag));
+
+  // A newly loaded catalogue: the answers go too.
+  m_Sim.Store().SetLastCacheLoadTime("2012-02-02T02:02:02");
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  m_Sim.Store().SetLastCacheLoadTime(loaded);
+  EXPECT_FALSE(m_Handle.client->m_Cache->ReadMetaData("getNavigation", "", value));
+}
+
+TEST_F(Client, UpdateLocalCacheRefreshesTheKindsGivenAndCached) {
+  VLTestDir dir;
+  VL_WS_SetupParams params = FileCache(dir.path());
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  CacheInterface* cache = m_Handle.client->m_Cache;
+  ASSERT_TRUE(cache->WriteMetaData("getNavigation", "", "answer"));
+  ASSERT_TRUE(cache->WriteBoxArt("t1001_", VL_WS_BOXART_175, 5, "Mon", 0, ""));
+  ASSERT_TRUE(cache->WriteWishlistFlag(1001, true));
+  m_Sim.ClearRequests();
+
+  unsigned int size = 0, needUpdate = 0;
+  VLString lastModified, data, value;
+  bool flag = false;
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
+  ASSERT_TRUE(cache->ReadBoxArt("t1001_", VL_WS_BOXART_175, size, lastModified, needUpdate, data));
+  EXPECT_EQ(1u, needUpdate);
+  EXPECT_TRUE(cache->ReadMetaData("getNavigation", "", value));
+  EXPECT_TRUE(cache->ReadWishlistFlag(1001, flag));
+  EXPECT_TRUE(m_Sim.Requests().empty());
+
+  // Metadata: a load time that cannot be fetched changes nothing, a new one empties the answers.
+  const std::string loaded = m_Sim.Store().LastCacheLoadTime();
+  m_Sim.Store().SetLastCacheLoadTime("2013-03-03T03:03:03");
+  Fault("getLastCacheLoadTimeUTC=status:503,times=1");
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_METADATA));
+  EXPECT_TRUE(cache->ReadMetaData("getNavigation", "", value));
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_METADATA));
+  m_Sim.Store().SetLastCacheLoadTime(loaded);
+  EXPECT_FALSE(cache->ReadMetaData("getNavigation", "", value));
+  EXPECT_TRUE(cache->ReadWishlistFlag(1001, flag));
+
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_USERDATA));
+  EXPECT_FALSE(cache->ReadWishlistFlag(1001, flag));
+
+  // Kinds the handle does not cache are left alone.
+  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(5);
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  m_Sim.ClearRequests();
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams()));
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, 7));
+  EXPECT_TRUE(m_Sim.Requests().empty());
+  VL_WS_Handle empty = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_updateLocalCache(&empty, 7));
+}
+
+TEST_F(Client, LastCacheLoadTimeIsTheStoresText) {
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams()));
+  VL_WS_String time;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getLastCacheLoadTimeUTC(&m_Handle, &time));
+  EXPECT_EQ(VL_WS_TAG_STRING, *time.tag);
+  EXPECT_EQ(m_Sim.Store().LastCacheLoadTime(), std::string(time.Text, time.Length));
+  VL_WS_release(&time);
+
+  Fault("getLastCacheLoadTimeUTC=status:503,times=1");
+  EXPECT_EQ(VL_WS_E_HTTP_STATUS(503), VL_WS_getLastCacheLoadTimeUTC(&m_Handle, &time));
+  EXPECT_EQ(VL_WS_TAG_STRING, *time.tag);
+  EXPECT_EQ(nullptr, time.Text);
+  VL_WS_release(&time);
+}
+
+TEST_F(Client, DuplicateHasItsOwnConnectionsAndCacheConnectionAndOutlivesItsSource) {
+  VLTestDir dir;
+  VL_WS_SetupParams params = FileCache(dir.path());
+  params.AccessType = UNKNOWN;
+  params.firmwareVersion = "fw";
+  params.AuthToken = "token-9";
+  m_Sim.Store().SetAccessType(DOWNLOAD);
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  ASSERT_TRUE(m_Handle.client->m_Cache->WriteMetaData("getNavigation", "", "answer"));
+  m_Sim.ClearRequests();
+
+  VL_WS_Handle copy = {};
+  ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));
+  EXPECT_TRUE(m_Sim.Requests().empty());  // nothing is asked again
+  ASSERT_NE(nullptr, copy.client);
+  EXPECT_EQ(VL_WS_TAG_HANDLE, *copy.tag);
+  EXPECT_NE(m_Handle.client, copy.client);
+  EXPECT_NE(m_Handle.client->m_Cache, copy.client->m_Cache);
+  const VL_WS_SetupParams2& p = copy.client->m_Params;
+  EXPECT_EQ(Settings().ServiceBaseURL, p.ServiceBaseURL);
+  EXPECT_EQ(Settings().CacheParam.CachePath, p.CacheParam.CachePath);
+  EXPECT_EQ("VLSDK: fw|", p.UserAgent);
+  EXPECT_EQ(DOWNLOAD, p.AccessType);
+  EXPECT_EQ(static_cast<soap*>(&copy.client->m_DownloadAPI), &static_cast<soap&>(copy.client->m_StreamDownloadAPI));
+
+  VL_WS_release(&m_Handle);
+  VLString value;
+  EXPECT_TRUE(copy.client->m_Cache->ReadMetaData("getNavigation", "", value));
+  EXPECT_EQ("answer", value);
+  VL_WS_FileType type;
+  EXPECT_EQ(VL_WS_OK, VL_WS_getFileType(&copy, &type));
+  VL_WS_release(&type);
+  ASSERT_EQ(1u, m_Sim.Requests().size());
+  EXPECT_EQ("token-9", m_Sim.Requests()[0].authToken);
+  EXPECT_EQ("VLSDK: fw|", m_Sim.Requests()[0].userAgent);
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
+  EXPECT_TRUE(IsEmpty(copy));
+}
+
+TEST_F(Client, DuplicateOfAMemoryCacheHandleHasNoCache) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.CacheType = 1;
+  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  VL_WS_Handle copy = {};
+  ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));
+  EXPECT_NE(nullptr, m_Handle.client->m_Cache);
+  EXPECT_EQ(nullptr, copy.client->m_Cache);
+  VL_WS_release(&copy);
+
+  // Without a source there is nothing to copy; the caller releases the copy.
+  VL_WS_Handle empty = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&copy, &empty));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&m_Handle, &m_Handle));
+  EXPECT_NE(nullptr, m_Handle.client);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(nullptr, &m_Handle));
+}
+
+TEST_F(Client, ReleasedHandleIsEmptyAndReleasingItAgainDoesNothing) {
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams()));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
+  EXPECT_TRUE(IsEmpty(m_Handle));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
+}
+
+TEST(ClientInterface, VersionAndEnvironmentList) {
+  VL_WS_Version version;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getVersion(&version));
+  EXPECT_EQ(VL_WS_TAG_VERSION, *version.tag);
+  EXPECT_EQ(1, version.Major);
+  EXPECT_EQ(3, version.Minor);
+  EXPECT_EQ(1, version.Revision);
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&version));
+
+  VL_WS_EnvList list;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getAvailableEnvLists(&list));
+  ASSERT_EQ(4, list.Count);
+  const char* names[] = {"stgapi", "stg", "production", "default"};
+  for (int i = 0; i < list.Count; ++i) {
+    EXPECT_EQ(i, list.Entries[i].EnvNum);
+    EXPECT_STREQ(names[i], list.Entries[i].Name);
+  }
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getVersion(nullptr));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getAvailableEnvLists(nullptr));
+}
+
+}  // namespace

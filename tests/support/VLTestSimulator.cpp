@@ -1,0 +1,39 @@
+#include "VLTestSimulator.h"
+
+#include <stdio.h>
+#include <stdlib.h>
+
+#include <memory>
+#include <string>
+
+VLSimServer& VLTestSimulator() {
+  static std::unique_ptr<VLSimServer> s_Sim = [] {
+    std::unique_ptr<VLSimServer> sim(new VLSimServer());
+    std::string error;
+    if (!sim->Start(&error)) {
+      fprintf(stderr, "the store simulator does not start: %s\n", error.c_str());
+      abort();
+    }
+    setenv("SSL_CERT_FILE", sim->CAFile().c_str(), 1);
+    setenv("VLWS_CONNECT_TO", sim->ConnectTo().c_str(), 1);
+    return sim;
+  }();
+  return *s_Sim;
+}
+
+VL_WS_SetupParams VLTestSetupParams() {
+  VLSimOptions defaults;
+  static const std::string s_User = defaults.userName, s_Password = defaults.password, s_Key = defaults.apiKey;
+  VL_WS_SetupParams params = {};
+  params.APIKey = s_Key.c_str();
+  params.DestinationUniqueID = "00-11-22-33-44-55";
+  params.DestinationTypeID = 7;
+  params.UserName = s_User.c_str();
+  params.Password = s_Password.c_str();
+  params.ContentType = VL_WS_SetupParams::GENERAL;
+  params.EnvNum = VL_WS_ENV_PRODUCTION;
+  params.CacheType = 0;
+  params.CacheData = VL_WS_CacheParam::CACHE_NONE;
+  params.AccessType = STREAM;
+  return params;
+}

@@ -1,0 +1,20 @@
+// The store simulator of a test program that drives the client library through its flat
+// interface, and setup records that fit it.
+#ifndef VLTESTSIMULATOR_H
+#define VLTESTSIMULATOR_H
+
+#include "VLSimServer.h"
+#include "VL_WS.h"
+
+// The program's simulator, started on ephemeral ports at the first call, with SSL_CERT_FILE and
+// VLWS_CONNECT_TO pointing at it. The library reads VLWS_CONNECT_TO at its first connection and
+// never again, so a program has this one simulator for all its tests: call it before any client
+// connects. Tests that change the simulator's faults or store should undo what they change.
+VLSimServer& VLTestSimulator();
+
+// A setup record the simulator accepts: its user, password and API key, device
+// "00-11-22-33-44-55" of type 7, the general catalogue in production, access type STREAM (no
+// question to the store), no cache and no proxy. The strings are static.
+VL_WS_SetupParams VLTestSetupParams();
+
+#endif  // VLTESTSIMULATOR_H
