@@ -1,0 +1,264 @@
+// The device and network operations against real sockets: the hand-built HTTP exchange
+// (VLHttpGet) against canned answers of a loopback server, and the operations against the store
+// simulator: the server time, the local address, the User-Agent and the device identifier.
+#include <gtest/gtest.h>
+#include <sys/socket.h>
+#include <time.h>
+
+#include <regex>
+#include <string>
+
+#include "VLHttpGet.h"
+#include "VLSoapTransport.h"
+#include "VLTestServer.h"
+#include "VLTestSimulator.h"
+#include "VL_WS.h"
+#include "VL_WS_Client.h"
+
+namespace {
+
+// ---- VLHttpGet ----
+
+// A context as the library's plain requests use it, with short time-outs.
+class HttpContext : public soap {
+ public:
+  HttpContext() : soap(SOAP_C_UTFSTRING) {
+    send_timeout = connect_timeout = recv_timeout = 5;
+    socket_flags = MSG_NOSIGNAL;
+    VLSoapTransport::Install(this);
+  }
+};
+
+class HttpGet : public testing::Test {
+ protected:
+  VLHttpGet::Result Get(const std::string& reply) {
+    m_Server.SetReply(reply);
+    return Run(m_Server.Port());
+  }
+  VLHttpGet::Result Run(int port) {
+    std::string url = "http://127.0.0.1:" + std::to_string(port) + "/probe";
+    return m_Get.Run(url.c_str(), "127.0.0.1", port, "GET /probe HTTP/1.1\r\nHost: probe\r\n\r\n");
+  }
+
+  VLTestServer m_Server;
+  HttpContext m_Context;
+  VLHttpGet m_Get{&m_Context};
+};
+
+TEST_F(HttpGet, FindsTheBodyAndTheHeaderFields) {
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\ncontent-length:  5 \r\nLast-Modified: Mon, 03 Jan 2011 "
+                                    "10:00:00 GMT\r\nX-Empty:\r\n\r\nhello"));
+  EXPECT_EQ(5u, m_Get.ContentLength());
+  ASSERT_EQ(5u, m_Get.BodyReceived());
+  EXPECT_STREQ("hello", m_Get.Body());
+  VLString value;
+  EXPECT_TRUE(m_Get.Field("Last-Modified", &value));
+  EXPECT_STREQ("Mon, 03 Jan 2011 10:00:00 GMT", value.c_str());
+  EXPECT_TRUE(m_Get.Field("x-empty", &value));
+  EXPECT_STREQ("", value.c_str());
+  EXPECT_FALSE(m_Get.Field("Content", &value));
+  EXPECT_FALSE(m_Get.Field("ETag", &value));
+  ASSERT_EQ(1u, m_Server.Requests().size());
+  EXPECT_EQ("GET /probe HTTP/1.1\r\nHost: probe\r\n\r\n", m_Server.Requests()[0]);
+}
+
+TEST_F(HttpGet, ABodyBeyondItsLengthIsCutAndALongerOneIsReadOn) {
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 3\r\n\r\nabcdef"));
+  EXPECT_EQ(3u, m_Get.BodyReceived());
+  EXPECT_STREQ("abc", m_Get.Body());
+
+  std::string body(10000, 'x');
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 10000\r\n\r\n" + body));
+  size_t total = m_Get.BodyReceived();
+  EXPECT_LT(total, 2048u);
+  char piece[4096];
+  while (size_t n = m_Get.Receive(piece, sizeof piece)) total += n;
+  EXPECT_EQ(10000u, total);
+}
+
+TEST_F(HttpGet, OtherAnswersAreNamed) {
+  static const char kNulInHeader[] = "HTTP/1.1 200 OK\r\nX-Nul: a\0b\r\nContent-Length: 1\r\n\r\nx";
+  struct {
+    std::string reply;
+    VLHttpGet::Result result;
+  } cases[] = {
+      {"HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n", VLHttpGet::HTTP_NOT_FOUND},
+      {"HTTP/1.1 304 Not Modified\r\n\r\n", VLHttpGet::HTTP_NOT_MODIFIED},
+      {"HTTP/1.1 500 Internal Server Error\r\nContent-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.0 200 OK\r\nContent-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 12x\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: -1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 99999999999999999999\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nX-Body: Content-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 1\r\n", VLHttpGet::HTTP_BAD_ANSWER},
+      // The whole header must come in the first piece.
+      {"HTTP/1.1 200 OK\r\nX-Long: " + std::string(3000, 'a') + "\r\nContent-Length: 1\r\n\r\nx",
+       VLHttpGet::HTTP_BAD_ANSWER},
+      {std::string(kNulInHeader, sizeof kNulInHeader - 1), VLHttpGet::HTTP_OK},
+      {"", VLHttpGet::HTTP_NOTHING_RECEIVED},
+  };
+  for (const auto& c : cases) EXPECT_EQ(c.result, Get(c.reply)) << c.reply;
+}
+
+TEST_F(HttpGet, ConnectionFailures) {
+  int closedPort;
+  {
+    VLTestServer gone;
+    closedPort = gone.Port();
+  }
+  EXPECT_EQ(VLHttpGet::HTTP_CONNECT_FAILED, Run(closedPort));
+  m_Server.SetBehaviour(VLTestServer::kCloseAtOnce);
+  EXPECT_NE(VLHttpGet::HTTP_OK, Run(m_Server.Port()));
+}
+
+TEST(HttpURL, SplitsHostPortAndPath) {
+  VLHttpURL parts;
+  ASSERT_TRUE(VLHttpGet::SplitURL("http://images.ostrel.example/probe/file.bin", &parts));
+  EXPECT_STREQ("images.ostrel.example", parts.host.c_str());
+  EXPECT_EQ(80, parts.port);
+  EXPECT_STREQ("probe/file.bin", parts.path.c_str());
+  ASSERT_TRUE(VLHttpGet::SplitURL("HTTPS://store.ostrel.example/api/RealTimeBrowse.asmx", &parts));
+  EXPECT_EQ(443, parts.port);
+  ASSERT_TRUE(VLHttpGet::SplitURL("http://127.0.0.1:8080/p", &parts));
+  EXPECT_STREQ("127.0.0.1", parts.host.c_str());
+  EXPECT_EQ(8080, parts.port);
+  for (const char* bad : {"http://host", "http://host/", "images.ostrel.example/probe", "http:///probe",
+                          "http://:80/probe", "http://host:/p", "http://host:0/p", "http://host:65536/p",
+                          "http://host:8o/p"})
+    EXPECT_FALSE(VLHttpGet::SplitURL(bad, &parts)) << bad;
+}
+
+// ---- Operations against the simulator ----
+
+class Device : public testing::Test {
+ protected:
+  void SetUp() override {
+    m_Sim.ClearFaults();
+    m_Sim.ClearRequests();
+  }
+  void TearDown() override {
+    VL_WS_release(&m_Handle);
+    m_Sim.ClearFaults();
+    m_Sim.Store().SetNow(time(nullptr));
+  }
+  void Fault(const std::string& spec) {
+    std::string error;
+    ASSERT_TRUE(m_Sim.AddFault(spec, &error)) << error;
+  }
+  void Init() {
+    VL_WS_SetupParams params = VLTestSetupParams();
+    params.firmwareVersion = "fw-2.1";
+    params.ApplicationRevision = "rev-7";
+    params.modelNumber = "BDP-1";
+    ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
+  }
+
+  VLSimServer& m_Sim = VLTestSimulator();
+  VL_WS_Handle m_Handle = {};
+};
+
+time_t UTC(int year, int month, int day, int hour, int minute, int second) {
+  struct tm t = {};
+  t.tm_year = year - 1900;
+  t.tm_mon = month - 1;
+  t.tm_mday = day;
+  t.tm_hour = hour;
+  t.tm_min = minute;
+  t.tm_sec = second;
+  return timegm(&t);
+}
+
+TEST_F(Device, ServerTimeReadsTheStoresTwelveHourClock) {
+  // 11:59:59 PM, 12:05:00 AM, 12:30:00 PM and 1:02:03 AM
+  for (time_t now : {UTC(2010, 12, 31, 23, 59, 59), UTC(2011, 1, 1, 0, 5, 0), UTC(2011, 6, 15, 12, 30, 0),
+                     UTC(2011, 6, 15, 1, 2, 3)}) {
+    m_Sim.Store().SetNow(now);
+    time_t got = 0;
+    EXPECT_EQ(VL_WS_OK, VL_WS_getServerTime(&got));
+    EXPECT_EQ(now, got);
+  }
+  ASSERT_TRUE(m_Sim.WaitForRequests(4, 2000));
+  std::vector<VLSimRequest> requests = m_Sim.Requests();
+  ASSERT_EQ(4u, requests.size());
+  EXPECT_EQ("store.ostrel.example", requests[0].host);
+  EXPECT_EQ("/device/time/", requests[0].path);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getServerTime(nullptr));
+}
+
+TEST_F(Device, ServerTimeFailuresLeaveTheTimeUnknown) {
+  struct {
+    const char* fault;
+    VL_WS_Status status;
+  } cases[] = {
+      {"/device/time/=status:503,times=1", VL_WS_E_NETWORK},
+      {"/device/time/=status:404,times=1", VL_WS_E_NETWORK},
+      {"/device/time/=close,times=1", VL_WS_E_NETWORK},
+      {"/device/time/=truncated,times=1", VL_WS_E_UNEXPECTED},  // "12/31/2010 " has three fields
+      {"/device/time/=badlength:64,times=1", VL_WS_E_UNEXPECTED},
+  };
+  m_Sim.Store().SetNow(UTC(2010, 12, 31, 23, 59, 59));
+  for (const auto& c : cases) {
+    Fault(c.fault);
+    time_t got = 0;
+    EXPECT_EQ(c.status, VL_WS_getServerTime(&got)) << c.fault;
+    EXPECT_EQ(-1, got) << c.fault;
+  }
+}
+
+TEST_F(Device, LocalAddressIsTheLocalEndOfAConnectionToTheService) {
+  Init();
+  VL_WS_String address;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getLocalIPAddr(&m_Handle, &address));
+  EXPECT_STREQ("127.0.0.1", address.Text);
+  EXPECT_EQ(9, address.Length);
+  VL_WS_release(&address);
+
+  VLString& base = m_Handle.client->m_Params.ServiceBaseURL;
+  VLString saved = base;
+  base = "https://no-path-here";
+  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getLocalIPAddr(&m_Handle, &address));
+  VL_WS_release(&address);
+  int closedPort;
+  {
+    VLTestServer gone;
+    closedPort = gone.Port();
+  }
+  base = ("http://127.0.0.1:" + std::to_string(closedPort) + "/api/").c_str();
+  EXPECT_EQ(VL_WS_E_CONNECT, VL_WS_getLocalIPAddr(&m_Handle, &address));
+  EXPECT_EQ(nullptr, address.Text);
+  VL_WS_release(&address);
+  base = saved;
+
+  VL_WS_Handle none = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getLocalIPAddr(&none, &address));
+  EXPECT_NE(nullptr, address.tag);
+  VL_WS_release(&address);
+}
+
+TEST_F(Device, UserAgentIsTheHandlesOwn) {
+  Init();
+  VL_WS_String agent;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getUserAgent(&m_Handle, &agent));
+  EXPECT_STREQ("VLSDK: fw-2.1|rev-7 VLMODEL:BDP-1", agent.Text);
+  VL_WS_release(&agent);
+
+  // A handle without client state leaves the record untouched.
+  VL_WS_Handle none = {};
+  VL_WS_String untouched = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getUserAgent(&none, &untouched));
+  EXPECT_EQ(nullptr, untouched.tag);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getUserAgent(&m_Handle, nullptr));
+}
+
+TEST(DeviceIdentifier, SixUpperCaseHexadecimalPairs) {
+  VL_WS_String id;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getDestinationUniqueID(&id));
+  EXPECT_TRUE(std::regex_match(id.Text, std::regex("[0-9A-F]{2}(-[0-9A-F]{2}){5}"))) << id.Text;
+  EXPECT_EQ(17, id.Length);
+  VL_WS_release(&id);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getDestinationUniqueID(nullptr));
+}
+
+}  // namespace
