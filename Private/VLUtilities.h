@@ -133,6 +133,17 @@ class VLUtilities {
   // as it is (not URL-encoded), the image word and ".jpg". Asserts that both texts are given.
   static VLString GetBoxArtImageFileName(const char* path, const char* boxartprefix,
                                          VL_WS_BoxArtSize size);
+  // Where the image host serves an image: the path "/images/boxart/<folder word>/<prefix><image
+  // word>.jpg" with the prefix URL-encoded, and the absolute URL "http://<image host><path>".
+  static VLString GetBoxArtImagePath(const char* boxartprefix, VL_WS_BoxArtSize size);
+  static VLString GetBoxArtImageURL(const char* boxartprefix, VL_WS_BoxArtSize size);
+  // Gives an image record (kind 0) its own copy of data's bytes, releasing bytes it held; empty
+  // data leaves it without bytes (null, length 0).
+  static void SetImageByData(VL_WS_Image& image, const VLString& data);
+  // Gives an image record the whole content of a file. The record is emptied first (kind 0, no
+  // bytes, releasing bytes it held); false, with the record left empty, when the file cannot be
+  // opened, is empty, or cannot be read whole.
+  static bool SetImageByFile(VL_WS_Image& image, const VLString& filename);
 
   // ---- Endpoint query (VLUtilities_Endpoint.cpp) ----------------------------------------------
 

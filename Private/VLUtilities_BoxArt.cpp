@@ -1,6 +1,11 @@
-// Box art and images: the size words of box-art images and the names of their cache files.
+// Box art and images: the size words of box-art images, where the image host serves them, the
+// names of their cache files, and the image record.
+#include <limits.h>
+#include <string.h>
+
 #include "VLAssert.h"
 #include "VLFile.h"
+#include "VLStoreHosts.h"
 #include "VLUtilities.h"
 
 namespace {
@@ -43,4 +48,54 @@ VLString VLUtilities::GetBoxArtImageFileName(const char* path, const char* boxar
   name += BoxArtSize2ImageSize(size);
   name += ".jpg";
   return name;
+}
+
+VLString VLUtilities::GetBoxArtImagePath(const char* boxartprefix, VL_WS_BoxArtSize size) {
+  VLString path("/images/boxart/");
+  path += BoxArtSize2FolderSize(size);
+  path += "/";
+  path += URLEncode(boxartprefix);
+  path += BoxArtSize2ImageSize(size);
+  path += ".jpg";
+  return path;
+}
+
+VLString VLUtilities::GetBoxArtImageURL(const char* boxartprefix, VL_WS_BoxArtSize size) {
+  return "http://" VL_STORE_IMAGE_HOST + GetBoxArtImagePath(boxartprefix, size);
+}
+
+namespace {
+
+// Frees the image's bytes: kind 0, no bytes.
+void ClearImage(VL_WS_Image& image) {
+  delete[] image.Data;
+  image.Data = 0;
+  image.Length = 0;
+  image.Kind = 0;
+}
+
+}  // namespace
+
+void VLUtilities::SetImageByData(VL_WS_Image& image, const VLString& data) {
+  ClearImage(image);
+  if (data.empty()) return;
+  image.Data = new char[data.length()];
+  memcpy(image.Data, data.c_str(), data.length());
+  image.Length = static_cast<int>(data.length());
+}
+
+bool VLUtilities::SetImageByFile(VL_WS_Image& image, const VLString& filename) {
+  ClearImage(image);
+  VLFile file;
+  if (!file.Open(filename.c_str(), "rb")) return false;
+  vl_int64 size = file.GetSize();
+  if (size < 1 || size > INT_MAX) return false;
+  char* data = new char[size];
+  if (file.Read(data, size) != size) {
+    delete[] data;
+    return false;
+  }
+  image.Data = data;
+  image.Length = static_cast<int>(size);
+  return true;
 }

@@ -152,6 +152,45 @@ VL_WS_Status VL_WS_updateLocalCache(VL_WS_Handle* handle, int dataKinds);
 VL_WS_Status VL_WS_clearLocalCache(const char* folder);
 
 /* ---------------------------------------------------------------------------------------------
+ * Box art
+ *
+ * Images come from the store's image host over plain HTTP, never through the handle's proxy.
+ * A cache that stores box art (CACHE_BOXART) keeps each image with its "Last-Modified" value;
+ * after VL_WS_updateLocalCache(handle, CACHE_BOXART) the next use of an image asks the image
+ * host once whether it changed.
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_getBoxArtImage - where the image of `prefix` in `size` can be loaded from, into a string
+ * record (release it).
+ *
+ * With a file cache that stores box art, the image is downloaded (or revalidated) into the
+ * cache folder as "<prefix><size>.jpg" and that file's name is returned. Otherwise, and when
+ * the download fails, the answer is the image's URL
+ * "http://<image host>/images/boxart/<folder size>/<URL-encoded prefix><size>.jpg".
+ *
+ * Returns VL_WS_OK, or VL_WS_E_INVALID_ARGUMENT (no client state, a null or empty prefix, a size
+ * that is not a VL_WS_BoxArtSize, a null `location`).
+ */
+VL_WS_Status VL_WS_getBoxArtImage(VL_WS_Handle* handle, VL_WS_BoxArtSize size, const char* prefix,
+                                  VL_WS_String* location);
+
+/*
+ * VL_WS_getBoxArtImageData - the bytes of the image of `prefix` in `size`, into an image record
+ * (release it).
+ *
+ * A cache that stores box art answers from its copy (revalidated when marked for it) and keeps
+ * every image downloaded; without one the image is downloaded every time.
+ *
+ * Returns VL_WS_OK, or VL_WS_E_INVALID_ARGUMENT (as VL_WS_getBoxArtImage, or a null `image`), or
+ * the download's failure: VL_WS_E_CONNECT (image host not reached), VL_WS_E_NETWORK (a transfer
+ * failure or an answer of the wrong form, an image announced above 32 MiB included),
+ * VL_WS_E_HTTP_NOT_FOUND (no such image) or VL_WS_E_FILE (the cache file could not be written).
+ */
+VL_WS_Status VL_WS_getBoxArtImageData(VL_WS_Handle* handle, VL_WS_BoxArtSize size, const char* prefix,
+                                      VL_WS_Image* image);
+
+/* ---------------------------------------------------------------------------------------------
  * Records
  * ------------------------------------------------------------------------------------------- */
 

@@ -3,7 +3,10 @@
 
 #include <string>
 
+#include "VLRecord.h"
+#include "VLTestDir.h"
 #include "VLUtilities.h"
+#include "VL_WS.h"
 
 namespace {
 
@@ -39,6 +42,48 @@ TEST(BoxArtImageFileName, LivesBesideTheCacheDatabase) {
   // A path without a folder part is taken as the folder.
   EXPECT_EQ("cache/t175.jpg", FileName("cache", "t", VL_WS_BOXART_175));
   EXPECT_EQ("./t175.jpg", FileName("", "t", VL_WS_BOXART_175));
+}
+
+TEST(BoxArtImageLocation, PathHasTheFolderWordAndTheEncodedPrefix) {
+  EXPECT_EQ("/images/boxart/135s/abc135.jpg", VLUtilities::GetBoxArtImagePath("abc", VL_WS_BOXART_135S));
+  EXPECT_EQ("http://images.ostrel.example/images/boxart/95/a%20b%2F%25c95.jpg",
+            VLUtilities::GetBoxArtImageURL("a b/%c", VL_WS_BOXART_95));
+}
+
+std::string Bytes(const VL_WS_Image& image) { return image.Data ? std::string(image.Data, image.Length) : "(null)"; }
+
+TEST(ImageRecord, TakesACopyOfTheBytes) {
+  VL_WS_Image image;
+  VLRecordInit(image);
+  std::string jpeg("\xFF\xD8\0\x01", 4);
+  VLUtilities::SetImageByData(image, VLString(jpeg.data(), jpeg.size()));
+  EXPECT_EQ(jpeg, Bytes(image));
+  EXPECT_EQ(0, image.Kind);
+  // New bytes replace the old ones; no bytes leave none.
+  VLUtilities::SetImageByData(image, "xy");
+  EXPECT_EQ("xy", Bytes(image));
+  VLUtilities::SetImageByData(image, "");
+  EXPECT_EQ("(null)", Bytes(image));
+  EXPECT_EQ(0, image.Length);
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&image));
+}
+
+TEST(ImageRecord, TakesAWholeFileOrNothing) {
+  VLTestDir dir;
+  std::string jpeg("\xFF\xD8\0\x01", 4);
+  ASSERT_TRUE(VLWriteFile(dir / "a.jpg", jpeg));
+  ASSERT_TRUE(VLWriteFile(dir / "empty.jpg", ""));
+  VL_WS_Image image;
+  VLRecordInit(image);
+  EXPECT_TRUE(VLUtilities::SetImageByFile(image, (dir / "a.jpg").c_str()));
+  EXPECT_EQ(jpeg, Bytes(image));
+  EXPECT_FALSE(VLUtilities::SetImageByFile(image, (dir / "empty.jpg").c_str()));
+  EXPECT_EQ("(null)", Bytes(image));
+  EXPECT_EQ(0, image.Length);
+  EXPECT_TRUE(VLUtilities::SetImageByFile(image, (dir / "a.jpg").c_str()));
+  EXPECT_FALSE(VLUtilities::SetImageByFile(image, (dir / "missing.jpg").c_str()));
+  EXPECT_EQ("(null)", Bytes(image));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&image));
 }
 
 TEST(BoxArtImageFileNameDeathTest, NeedsPathAndPrefix) {

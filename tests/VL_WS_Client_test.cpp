@@ -43,10 +43,16 @@ class Client : public testing::Test {
     return VL_WS_initialize(&m_Handle, &params);
   }
   VL_WS_SetupParams2& Settings() { return m_Handle.client->m_Params; }
-  // The requests of the log whose path starts with path.
-  std::vector<VLSimRequest> RequestsTo(const std::string& path) {
+  // The request log once it holds count requests: the simulator logs a request after its answer
+  // went out, and the client may be done with the answer before.
+  std::vector<VLSimRequest> Requests(size_t count) {
+    m_Sim.WaitForRequests(count, 5000);
+    return m_Sim.Requests();
+  }
+  // The requests of the log (once it holds count) whose path starts with path.
+  std::vector<VLSimRequest> RequestsTo(const std::string& path, size_t count) {
     std::vector<VLSimRequest> found;
-    for (const VLSimRequest& r : m_Sim.Requests())
+    for (const VLSimRequest& r : Requests(count))
       if (r.path.compare(0, path.size(), path) == 0) found.push_back(r);
     return found;
   }
@@ -96,7 +102,7 @@ TEST_F(Client, FixedEnvironmentsTakeTheirEndpointWithoutAsking) {
     VL_WS_EnvID env = -1;
     EXPECT_EQ(VL_WS_OK, VL_WS_getDeviceEnv(&m_Handle, &env));
     EXPECT_EQ(c.env, env);
-    std::vector<VLSimRequest> requests = m_Sim.Requests();
+    std::vector<VLSimRequest> requests = Requests(1);
     ASSERT_EQ(1u, requests.size());
     EXPECT_EQ("getFileType", requests[0].operation);
     EXPECT_EQ(c.host, requests[0].host);
@@ -129,7 +135,7 @@ TEST_F(Client, DefaultEnvironmentIsTheDigitTheDeviceEnvironmentServiceAnswers) {
     EXPECT_EQ(std::string("\n---> End-Point URL: ") + c.base + " <---\n\n", testing::internal::GetCapturedStdout());
     EXPECT_EQ(c.base, Settings().ServiceBaseURL);
     EXPECT_EQ(c.digit, Settings().EnvID);
-    std::vector<VLSimRequest> asked = RequestsTo("/device/env/");
+    std::vector<VLSimRequest> asked = RequestsTo("/device/env/", 1);
     ASSERT_EQ(1u, asked.size());
     EXPECT_TRUE(asked[0].tls);
     EXPECT_EQ("store.ostrel.example", asked[0].host);
@@ -144,7 +150,7 @@ TEST_F(Client, DeviceIdentifierIsSentUrlEncoded) {
   params.DestinationTypeID = -3;
   params.EnvNum = VL_WS_ENV_DEFAULT;
   ASSERT_EQ(VL_WS_OK, Init(params));
-  std::vector<VLSimRequest> asked = RequestsTo("/device/env/");
+  std::vector<VLSimRequest> asked = RequestsTo("/device/env/", 1);
   ASSERT_EQ(1u, asked.size());
   EXPECT_EQ("d=box%201%2Fa%26b&dt=-3", asked[0].query);
 }
@@ -335,9 +341,9 @@ TEST_F(Client, UserAgentTellsFirmwareRevisionAndModel) {
     std::string expected = "\n=======>Content type:0, envID:2, endpoint URL:https://store.ostrel.example/api/\n";
     if (*c.userAgent) expected += std::string("\n***---> User-Agent = ") + c.userAgent;
     EXPECT_EQ(expected, printed);
-    ASSERT_EQ(1u, m_Sim.Requests().size());
+    ASSERT_EQ(1u, Requests(1).size());
     std::string sent = *c.userAgent ? std::string(c.userAgent + (*c.userAgent == ' ')) : "gSOAP/2.7";
-    EXPECT_EQ(sent, m_Sim.Requests()[0].userAgent);
+    EXPECT_EQ(sent, Requests(1)[0].userAgent);
   }
 }
 
@@ -348,9 +354,9 @@ TEST_F(Client, UnknownAccessTypeIsAskedOfTheStore) {
   ASSERT_EQ(VL_WS_OK, Init(params));
   EXPECT_EQ(DOWNLOAD, Settings().AccessType);
   EXPECT_EQ(static_cast<soap*>(&m_Handle.client->m_DownloadAPI), &static_cast<soap&>(m_Handle.client->m_StreamDownloadAPI));
-  ASSERT_EQ(1u, m_Sim.Requests().size());
-  EXPECT_EQ("RealTimeBrowse", m_Sim.Requests()[0].service);
-  EXPECT_EQ("VL1:DeviceSettings", m_Sim.Requests()[0].settingsElement);
+  ASSERT_EQ(1u, Requests(1).size());
+  EXPECT_EQ("RealTimeBrowse", Requests(1)[0].service);
+  EXPECT_EQ("VL1:DeviceSettings", Requests(1)[0].settingsElement);
 
   // Any value but DOWNLOAD and STREAM asks.
   m_Sim.Store().SetAccessType(STREAM);
@@ -462,8 +468,8 @@ TEST_F(Client, InitialisationRefreshesMetadataAndPurgesUserData) {
   VL_WS_SetupParams params = FileCache(dir.path());
   const std::string loaded = m_Sim.Store().LastCacheLoadTime();
   ASSERT_EQ(VL_WS_OK, Init(params));
-  EXPECT_EQ(1u, RequestsTo("/api/RealTimeBrowse.asmx").size());
-  EXPECT_EQ("getLastCacheLoadTimeUTC", m_Sim.Requests().back().operation);
+  ASSERT_EQ(1u, RequestsTo("/api/RealTimeBrowse.asmx", 1).size());
+  EXPECT_EQ("getLastCacheLoadTimeUTC", Requests(1).back().operation);
   CacheInterface* cache = m_Handle.client->m_Cache;
   ASSERT_TRUE(cache->WriteMetaData("getNavigation", "", "answer"));
   ASSERT_TRUE(cache->WriteWishlistFlag(1001, true));
@@ -576,9 +582,9 @@ TEST_F(Client, DuplicateHasItsOwnConnectionsAndCacheConnectionAndOutlivesItsSour
   VL_WS_FileType type;
   EXPECT_EQ(VL_WS_OK, VL_WS_getFileType(&copy, &type));
   VL_WS_release(&type);
-  ASSERT_EQ(1u, m_Sim.Requests().size());
-  EXPECT_EQ("token-9", m_Sim.Requests()[0].authToken);
-  EXPECT_EQ("VLSDK: fw|", m_Sim.Requests()[0].userAgent);
+  ASSERT_EQ(1u, Requests(1).size());
+  EXPECT_EQ("token-9", Requests(1)[0].authToken);
+  EXPECT_EQ("VLSDK: fw|", Requests(1)[0].userAgent);
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
   EXPECT_TRUE(IsEmpty(copy));
 }

@@ -96,6 +96,9 @@ class VLTestServer {
   std::vector<std::string> m_Requests;
 };
 
+// A loopback port on which nobody listens (bound once and released): connections to it fail.
+int VLClosedPort();
+
 #endif  // VLTESTSERVER_H
 
 #include "VL_WS_SetupParams2.h"

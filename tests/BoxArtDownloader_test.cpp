@@ -1,0 +1,208 @@
+// BoxArtDownloader against a canned image host (a loopback server that plays one answer per
+// connection): the request it sends, how it reads answers, and what it leaves on disk.
+#include <dirent.h>
+#include <gtest/gtest.h>
+#include <stdlib.h>
+#include <sys/stat.h>
+
+#include <set>
+#include <string>
+
+#include "BoxArtDownloader.h"
+#include "RealTimeBrowse.h"
+#include "VLStoreHosts.h"
+#include "VLTestDir.h"
+#include "VLTestServer.h"
+
+namespace {
+
+// The image host of this program: VLWS_CONNECT_TO sends images.ostrel.example:80 here. The
+// library reads the variable once, at its first connection.
+VLTestServer& ImageHost() {
+  static VLTestServer s_Server;
+  static const bool s_Mapped = [] {
+    std::string map = std::string(VL_STORE_IMAGE_HOST) + ":80:127.0.0.1:" + std::to_string(s_Server.Port());
+    return setenv("VLWS_CONNECT_TO", map.c_str(), 1) == 0;
+  }();
+  EXPECT_TRUE(s_Mapped);
+  return s_Server;
+}
+
+// The names in a folder.
+std::set<std::string> Files(const std::string& folder) {
+  std::set<std::string> names;
+  DIR* dir = opendir(folder.c_str());
+  while (dirent* entry = dir ? readdir(dir) : nullptr) {
+    std::string name = entry->d_name;
+    if (name != "." && name != "..") names.insert(name);
+  }
+  if (dir) closedir(dir);
+  return names;
+}
+
+std::string Ok(const std::string& body, const std::string& headers = "") {
+  return "HTTP/1.1 200 OK\r\nContent-Type: image/jpeg\r\n" + headers + "Content-Length: " + std::to_string(body.size()) +
+         "\r\nConnection: close\r\n\r\n" + body;
+}
+
+// Bytes of every value, zeros included, as an image has them.
+std::string Image(size_t size) {
+  std::string data(size, '\0');
+  for (size_t i = 0; i < size; ++i) data[i] = static_cast<char>(i * 7 % 256);
+  return data;
+}
+
+const char kLastModified[] = "Mon, 03 Jan 2011 10:00:00 GMT";
+
+class BoxArtDownloaderTest : public testing::Test {
+ protected:
+  BoxArtDownloaderTest() : m_Downloader(&m_Context) { m_Context.recv_timeout = 5; }
+
+  VL_WS_Status Get(const std::string& reply, std::string* data = nullptr, const char* since = "") {
+    m_Host.SetReply(reply);
+    VLString bytes("garbage");
+    VL_WS_Status status = m_Downloader.DownloadToBuffer("t1001_", VL_WS_BOXART_175, since, bytes);
+    if (data) *data = std::string(bytes.c_str(), bytes.length());
+    return status;
+  }
+  VL_WS_Status GetFile(const std::string& reply, const std::string& file) {
+    m_Host.SetReply(reply);
+    return m_Downloader.DownloadToFile("t1001_", VL_WS_BOXART_175, "", file.c_str());
+  }
+  std::string LastRequest() { return m_Host.Requests().empty() ? "" : m_Host.Requests().back(); }
+
+  VLTestServer& m_Host = ImageHost();
+  RealTimeBrowse m_Context;  // a catalogue context: the library's transport and time-outs
+  BoxArtDownloader m_Downloader;
+};
+
+TEST_F(BoxArtDownloaderTest, SendsAHandBuiltGetConditionalWhenAsked) {
+  VLString data;
+  m_Host.SetReply(Ok("x"));
+  ASSERT_EQ(VL_WS_OK, m_Downloader.DownloadToBuffer("night owl_", VL_WS_BOXART_135S, "", data));
+  EXPECT_EQ(
+      "GET /images/boxart/135s/night%20owl_135.jpg HTTP/1.1\r\n"
+      "User-Agent: DUDUVud\r\nHost: images.ostrel.example\r\n\r\n",
+      LastRequest());
+  ASSERT_EQ(VL_WS_OK, m_Downloader.DownloadToBuffer("t1001_", VL_WS_BOXART_321, kLastModified, data));
+  EXPECT_EQ(std::string("GET /images/boxart/321/t1001_321.jpg HTTP/1.1\r\nIf-Modified-Since: ") + kLastModified +
+                "\r\nUser-Agent: DUDUVud\r\nHost: images.ostrel.example\r\n\r\n",
+            LastRequest());
+}
+
+TEST_F(BoxArtDownloaderTest, ReadsTheImageAndItsValidators) {
+  EXPECT_EQ(0u, m_Downloader.GetContentLength());
+  EXPECT_TRUE(m_Downloader.GetLastModified().empty());
+  std::string image = Image(10000), data;  // several receives after the first piece
+  ASSERT_EQ(VL_WS_OK, Get(Ok(image, std::string("Last-Modified: ") + kLastModified + "\r\n"), &data));
+  EXPECT_EQ(image, data);
+  EXPECT_EQ(10000u, m_Downloader.GetContentLength());
+  EXPECT_EQ(kLastModified, m_Downloader.GetLastModified());
+
+  // Each download starts afresh: no "Last-Modified" gives none, a failure gives 0.
+  ASSERT_EQ(VL_WS_OK, Get(Ok("abc"), &data));
+  EXPECT_EQ("abc", data);
+  EXPECT_TRUE(m_Downloader.GetLastModified().empty());
+  EXPECT_EQ(VL_WS_E_NETWORK, Get(""));
+  EXPECT_EQ(0u, m_Downloader.GetContentLength());
+}
+
+TEST_F(BoxArtDownloaderTest, StatusLinesOtherThan200) {
+  std::string data;
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Get("HTTP/1.1 404 Not Found\r\nContent-Length: 3\r\n\r\nno!", &data));
+  EXPECT_EQ("", data);
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_MODIFIED,
+            Get(std::string("HTTP/1.1 304 Not Modified\r\nLast-Modified: ") + kLastModified + "\r\n\r\n"));
+  EXPECT_EQ(VL_WS_E_NETWORK, Get("HTTP/1.1 500 Internal Server Error\r\nContent-Length: 1\r\n\r\nx"));
+  EXPECT_EQ(VL_WS_E_NETWORK, Get("HTTP/1.0 200 OK\r\nContent-Length: 1\r\n\r\nx"));
+  EXPECT_EQ(VL_WS_E_NETWORK, Get(""));  // the host closes without answering
+}
+
+TEST_F(BoxArtDownloaderTest, HeaderMustAnnounceASaneLengthWithinTheFirstPiece) {
+  const char* refused[] = {
+      "HTTP/1.1 200 OK\r\nContent-Type: image/jpeg\r\n\r\nabc",
+      "HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n",
+      "HTTP/1.1 200 OK\r\nContent-Length: -5\r\n\r\nabc",
+      "HTTP/1.1 200 OK\r\nContent-Length: 3x\r\n\r\nabc",
+      "HTTP/1.1 200 OK\r\nContent-Length: 3",                      // no end of line, no blank line
+      "HTTP/1.1 200 OK\r\nX: y\r\n\r\nContent-Length: 3\r\n\r\nabc",  // the field is in the body
+      "HTTP/1.1 200 OK\r\nContent-Length: 33554433\r\n\r\nabc",      // above 32 MiB
+      "HTTP/1.1 200 OK\r\nContent-Length: 99999999999\r\n\r\nabc",
+  };
+  for (const char* reply : refused) {
+    SCOPED_TRACE(reply);
+    EXPECT_EQ(VL_WS_E_NETWORK, Get(reply));
+  }
+  std::string padded = "HTTP/1.1 200 OK\r\nX-Pad: " + std::string(2040, 'p') + "\r\nContent-Length: 3\r\n\r\nabc";
+  EXPECT_EQ(VL_WS_E_NETWORK, Get(padded));
+}
+
+TEST_F(BoxArtDownloaderTest, BodyBeyondTheAnnouncedLengthIsNotTaken) {
+  std::string data;
+  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 5\r\n\r\nABCDEFGHIJ", &data));
+  EXPECT_EQ("ABCDE", data);
+  EXPECT_EQ(5u, m_Downloader.GetContentLength());
+}
+
+TEST_F(BoxArtDownloaderTest, AnswerEndingEarlyFails) {
+  std::string data;
+  EXPECT_EQ(VL_WS_E_NETWORK, Get("HTTP/1.1 200 OK\r\nContent-Length: 100\r\n\r\nshort", &data));
+  EXPECT_EQ("", data);
+}
+
+TEST_F(BoxArtDownloaderTest, FileIsReplacedOnlyByACompleteImage) {
+  VLTestDir dir;
+  std::string file = dir / "t1001_175.jpg";
+  ASSERT_TRUE(VLWriteFile(file, "old"));
+  std::string image = Image(5000);
+  ASSERT_EQ(VL_WS_OK, GetFile(Ok(image), file));
+  EXPECT_EQ(image, VLReadFile(file));
+  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, Files(dir.path()));
+
+  const char* failures[] = {
+      "HTTP/1.1 304 Not Modified\r\n\r\n",
+      "HTTP/1.1 404 Not Found\r\nContent-Length: 1\r\n\r\nx",
+      "HTTP/1.1 200 OK\r\nContent-Length: 100000\r\n\r\nonly the start",
+      "HTTP/1.1 200 OK\r\nContent-Length: 33554433\r\n\r\nabc",
+      "",
+  };
+  for (const char* reply : failures) {
+    SCOPED_TRACE(reply);
+    EXPECT_NE(VL_WS_OK, GetFile(reply, file));
+    EXPECT_EQ(image, VLReadFile(file));
+    EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, Files(dir.path()));
+  }
+  // A new file appears only when complete.
+  std::string fresh = dir / "t1001_95.jpg";
+  EXPECT_EQ(VL_WS_E_NETWORK, GetFile("HTTP/1.1 200 OK\r\nContent-Length: 10\r\n\r\nabc", fresh));
+  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, Files(dir.path()));
+}
+
+TEST_F(BoxArtDownloaderTest, FileThatCannotBeWrittenEndsWithAFileError) {
+  VLTestDir dir;
+  // No temporary file in a missing folder: nothing is asked of the host.
+  size_t asked = m_Host.Requests().size();
+  EXPECT_EQ(VL_WS_E_FILE, GetFile(Ok("abc"), dir / "missing/t1001_175.jpg"));
+  EXPECT_EQ(asked, m_Host.Requests().size());
+
+  // A folder with content in the destination's place cannot be replaced.
+  std::string blocked = dir / "t1001_175.jpg";
+  ASSERT_EQ(0, mkdir(blocked.c_str(), 0755));
+  ASSERT_TRUE(VLWriteFile(blocked + "/keep", "x"));
+  EXPECT_EQ(VL_WS_E_FILE, GetFile(Ok("abc"), blocked));
+  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, Files(dir.path()));
+}
+
+TEST_F(BoxArtDownloaderTest, UnreachableHostEndsWithAConnectionError) {
+  VLTestDir dir;
+  // The host is reached through a proxy here, so that the connection can fail.
+  m_Context.proxy_host = "127.0.0.1";
+  m_Context.proxy_port = VLClosedPort();
+  std::string data;
+  EXPECT_EQ(VL_WS_E_CONNECT, Get(Ok("abc"), &data));
+  EXPECT_EQ(VL_WS_E_CONNECT, GetFile(Ok("abc"), dir / "t1001_175.jpg"));
+  EXPECT_TRUE(Files(dir.path()).empty());
+  m_Context.proxy_host = nullptr;
+}
+
+}  // namespace

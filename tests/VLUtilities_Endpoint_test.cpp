@@ -1,0 +1,129 @@
+// The endpoint choice and the device-environment query against a canned device-environment
+// service (a loopback TLS server that plays one answer per connection): the exact request and
+// which answers are accepted.
+#include <gtest/gtest.h>
+#include <stdlib.h>
+
+#include <string>
+
+#include "Setup_SSL_Client_CACerts.h"
+#include "StreamAPI.h"
+#include "VLStoreHosts.h"
+#include "VLTestServer.h"
+#include "VLUtilities.h"
+
+namespace {
+
+// The device-environment service of this program: VLWS_CONNECT_TO sends the production host's
+// port 443 here, and the test CA is trusted through SSL_CERT_FILE.
+VLTestServer& EnvironmentService() {
+  static VLTestServer s_Server(&VLTestPKI::Get().Trusted());
+  static const bool s_Mapped = [] {
+    std::string map = std::string(VL_STORE_PRODUCTION_HOST) + ":443:127.0.0.1:" + std::to_string(s_Server.Port());
+    return setenv("VLWS_CONNECT_TO", map.c_str(), 1) == 0;
+  }();
+  EXPECT_TRUE(s_Mapped);
+  return s_Server;
+}
+
+std::string Answer(const std::string& body) {
+  return "HTTP/1.1 200 OK\r\nContent-Type: text/plain\r\nContent-Length: " + std::to_string(body.size()) +
+         "\r\nConnection: close\r\n\r\n" + body;
+}
+
+class EndpointQuery : public testing::Test {
+ protected:
+  void SetUp() override {
+    ASSERT_EQ(SOAP_OK, Setup_SSL_Client_CACerts(&m_Context));
+    m_Context.recv_timeout = 5;
+  }
+
+  // Asks with a default environment number; the text returned, envID starting at -1.
+  std::string Ask(const std::string& reply, VL_WS_EnvID* envID,
+                  enum VL_WS_SetupParams::ContentType content = VL_WS_SetupParams::GENERAL) {
+    m_Service.SetReply(reply);
+    *envID = -1;
+    testing::internal::CaptureStdout();
+    const char* url = VLUtilities::QueryServiceBaseURL(content, &m_Context, "00-11", 7, VL_WS_ENV_DEFAULT, *envID);
+    m_Printed = testing::internal::GetCapturedStdout();
+    return url;
+  }
+
+  VLTestServer& m_Service = EnvironmentService();
+  StreamAPI m_Context;
+  std::string m_Printed;
+};
+
+TEST_F(EndpointQuery, FixedEnvironmentsNeverAsk) {
+  const char* expected[2][3] = {
+      {"https://stgapi.ostrel.example/api/", "https://stg.ostrel.example/api/", "https://store.ostrel.example/api/"},
+      {"https://stgapi.ostrel.example/aac/api/", "https://stg.adult.ostrel.example/api/",
+       "https://adult.ostrel.example/api/"},
+  };
+  size_t asked = m_Service.Requests().size();
+  for (int content = 0; content < 2; ++content) {
+    for (int env = 0; env < 3; ++env) {
+      VL_WS_EnvID id = -1;
+      testing::internal::CaptureStdout();
+      std::string url = VLUtilities::QueryServiceBaseURL(static_cast<enum VL_WS_SetupParams::ContentType>(content),
+                                                          &m_Context, "00-11", 7, static_cast<VL_WS_EnvNum>(env), id);
+      testing::internal::GetCapturedStdout();
+      EXPECT_EQ(expected[content][env], url);
+      EXPECT_EQ(env, id);
+    }
+  }
+  EXPECT_EQ(asked, m_Service.Requests().size());
+}
+
+TEST_F(EndpointQuery, AsksWithAHandBuiltGet) {
+  VL_WS_EnvID env;
+  m_Service.SetReply(Answer("1"));
+  env = -1;
+  std::string url = VLUtilities::QueryServiceBaseURL(VL_WS_SetupParams::GENERAL, &m_Context, "a b/c", 7,
+                                                     static_cast<VL_WS_EnvNum>(4), env);
+  EXPECT_EQ("https://stg.ostrel.example/api/", url);
+  EXPECT_EQ(1, env);
+  EXPECT_EQ(
+      "GET /device/env/?d=a%20b%2Fc&dt=7 HTTP/1.1\r\nUser-Agent: DUDUVud\r\nHost: store.ostrel.example\r\n\r\n",
+      m_Service.Requests().back());
+}
+
+TEST_F(EndpointQuery, OnlyAnOkAnswerOfOneDigitChoosesTheEnvironment) {
+  VL_WS_EnvID env;
+  EXPECT_EQ("https://stgapi.ostrel.example/api/", Ask(Answer("0"), &env));
+  EXPECT_EQ(0, env);
+  EXPECT_EQ("\n---> End-Point URL: https://stgapi.ostrel.example/api/ <---\n\n", m_Printed);
+  EXPECT_EQ("https://stg.adult.ostrel.example/api/", Ask(Answer("1"), &env, VL_WS_SetupParams::ADULT));
+  EXPECT_EQ(1, env);
+  // Another digit is kept and served by production.
+  EXPECT_EQ("https://store.ostrel.example/api/", Ask(Answer("5"), &env));
+  EXPECT_EQ(5, env);
+
+  const char* production[] = {
+      "HTTP/1.1 200 OK\r\nContent-Length: 1\r\n\r\n",   // the digit is missing
+      "HTTP/1.1 200 OK\r\nContent-Length: 1\r\n\r\nx",  // not a digit
+      "HTTP/1.1 200 OK\r\nContent-Length: 2\r\n\r\n10",
+      "HTTP/1.1 404 Not Found\r\nContent-Length: 1\r\n\r\n1",
+      "HTTP/1.0 200 OK\r\nContent-Length: 1\r\n\r\n1",
+      "",  // the service closes without answering
+  };
+  for (const char* reply : production) {
+    SCOPED_TRACE(reply);
+    EXPECT_EQ("https://store.ostrel.example/api/", Ask(reply, &env));
+    EXPECT_EQ(2, env);
+  }
+  EXPECT_EQ("https://adult.ostrel.example/api/", Ask("", &env, VL_WS_SetupParams::ADULT));
+}
+
+TEST_F(EndpointQuery, UnreachableServiceGivesNoEndpointAndKeepsTheEnvironment) {
+  // The service is reached through a proxy here, so that the connection can fail.
+  m_Context.proxy_host = "127.0.0.1";
+  m_Context.proxy_port = VLClosedPort();
+  VL_WS_EnvID env;
+  EXPECT_EQ("", Ask(Answer("1"), &env));
+  EXPECT_EQ(-1, env);
+  EXPECT_EQ("", m_Printed);
+  m_Context.proxy_host = nullptr;
+}
+
+}  // namespace

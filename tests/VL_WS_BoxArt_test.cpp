@@ -1,0 +1,293 @@
+// The box-art operations against the store simulator's image host: the file cache (image files
+// beside the database, revalidation), the memory cache, no cache, failures and the proxy.
+#include <dirent.h>
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "CacheInterface.h"
+#include "VLSimBoxArt.h"
+#include "VLTestDir.h"
+#include "VLTestServer.h"
+#include "VLTestSimulator.h"
+#include "VL_WS.h"
+#include "VL_WS_Client.h"
+
+namespace {
+
+// The names in a folder that are not the cache database.
+std::vector<std::string> ImageFolderFiles(const std::string& folder) {
+  std::vector<std::string> names;
+  DIR* dir = opendir(folder.c_str());
+  while (dirent* entry = dir ? readdir(dir) : nullptr) {
+    std::string name = entry->d_name;
+    if (name != "." && name != ".." && name.find(".vl") == std::string::npos) names.push_back(name);
+  }
+  if (dir) closedir(dir);
+  return names;
+}
+
+class BoxArt : public testing::Test {
+ protected:
+  void SetUp() override {
+    m_Sim.ClearFaults();
+    m_Sim.ClearRequests();
+  }
+  void TearDown() override {
+    VL_WS_release(&m_Handle);
+    m_Sim.ClearFaults();
+  }
+
+  // A handle with a cache of cacheType that stores every kind of data (file caches in m_Dir).
+  void Init(int cacheType, const char* proxyHost = nullptr, int proxyPort = 0) {
+    VL_WS_SetupParams params = VLTestSetupParams();
+    params.CacheType = cacheType;
+    params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(cacheType ? 7 : 0);
+    params.CachePath = m_Dir.path().c_str();
+    params.ProxyHost = proxyHost;
+    params.ProxyPort = proxyPort;
+    ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
+    m_Sim.ClearRequests();
+  }
+  std::string Location(VL_WS_BoxArtSize size, const char* prefix) {
+    VL_WS_String location;
+    EXPECT_EQ(VL_WS_OK, VL_WS_getBoxArtImage(&m_Handle, size, prefix, &location));
+    std::string text = location.Text ? std::string(location.Text, location.Length) : "(null)";
+    VL_WS_release(&location);
+    return text;
+  }
+  VL_WS_Status Data(VL_WS_BoxArtSize size, const char* prefix, std::string* bytes) {
+    VL_WS_Image image;
+    VL_WS_Status status = VL_WS_getBoxArtImageData(&m_Handle, size, prefix, &image);
+    EXPECT_EQ(VL_WS_TAG_IMAGE, *image.tag);
+    EXPECT_EQ(0, image.Kind);
+    *bytes = image.Data ? std::string(image.Data, image.Length) : "";
+    VL_WS_release(&image);
+    return status;
+  }
+  // The image the simulator serves now.
+  std::string Served(const std::string& prefix, VL_WS_BoxArtSize size) {
+    return VLSimBoxArtJpeg(prefix, size, m_Sim.Store().BoxArtVersion(prefix));
+  }
+  // The requests the image host answered, once the log holds count requests: the simulator logs
+  // a request after its answer went out, and the client may be done with the answer before.
+  std::vector<VLSimRequest> Images(size_t count) {
+    m_Sim.WaitForRequests(count, 5000);
+    std::vector<VLSimRequest> images;
+    for (const VLSimRequest& r : m_Sim.Requests())
+      if (r.host == "images.ostrel.example") images.push_back(r);
+    return images;
+  }
+  bool ReadRow(const char* prefix, VL_WS_BoxArtSize size, unsigned int* length, std::string* lastModified,
+               unsigned int* needUpdate, std::string* data) {
+    VLString modified, bytes;
+    bool found = m_Handle.client->m_Cache->ReadBoxArt(prefix, size, *length, modified, *needUpdate, bytes);
+    *lastModified = modified.c_str();
+    *data = std::string(bytes.c_str(), bytes.length());
+    return found;
+  }
+
+  VLSimServer& m_Sim = VLTestSimulator();
+  VLTestDir m_Dir;
+  VL_WS_Handle m_Handle = {};
+};
+
+TEST_F(BoxArt, FileCacheDownloadsOnceAndThenAnswersFromTheFile) {
+  Init(2);
+  std::string file = m_Dir / "t1001_175.jpg";
+  EXPECT_EQ(file, Location(VL_WS_BOXART_175, "t1001_"));
+  EXPECT_EQ(Served("t1001_", VL_WS_BOXART_175), VLReadFile(file));
+  std::vector<VLSimRequest> images = Images(1);
+  ASSERT_EQ(1u, images.size());
+  EXPECT_EQ("/images/boxart/175/t1001_175.jpg", images[0].path);
+  EXPECT_EQ("DUDUVud", images[0].userAgent);
+  EXPECT_EQ("", images[0].ifModifiedSince);
+
+  unsigned int length = 0, needUpdate = 9;
+  std::string lastModified, data;
+  ASSERT_TRUE(ReadRow("t1001_", VL_WS_BOXART_175, &length, &lastModified, &needUpdate, &data));
+  EXPECT_EQ(VLReadFile(file).size(), length);
+  EXPECT_NE("", lastModified);
+  EXPECT_EQ(0u, needUpdate);
+  EXPECT_EQ("", data);  // the image is the file
+
+  EXPECT_EQ(file, Location(VL_WS_BOXART_175, "t1001_"));
+  EXPECT_EQ(1u, Images(1).size());
+
+  // An image file that disappeared is fetched again.
+  ASSERT_EQ(0, remove(file.c_str()));
+  EXPECT_EQ(file, Location(VL_WS_BOXART_175, "t1001_"));
+  EXPECT_EQ(2u, Images(2).size());
+  EXPECT_EQ(Served("t1001_", VL_WS_BOXART_175), VLReadFile(file));
+}
+
+TEST_F(BoxArt, MarkedImagesAreRevalidatedOnceWithAConditionalGet) {
+  Init(2);
+  std::string file = m_Dir / "t1002_95.jpg";
+  ASSERT_EQ(file, Location(VL_WS_BOXART_95, "t1002_"));
+  std::string first = VLReadFile(file);
+  unsigned int length = 0, needUpdate = 0;
+  std::string lastModified, data;
+  ASSERT_TRUE(ReadRow("t1002_", VL_WS_BOXART_95, &length, &lastModified, &needUpdate, &data));
+
+  ASSERT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
+  EXPECT_EQ(file, Location(VL_WS_BOXART_95, "t1002_"));
+  std::vector<VLSimRequest> images = Images(2);
+  ASSERT_EQ(2u, images.size());
+  EXPECT_EQ(lastModified, images[1].ifModifiedSince);
+  EXPECT_EQ(304, images[1].status);
+  EXPECT_EQ(first, VLReadFile(file));
+  ASSERT_TRUE(ReadRow("t1002_", VL_WS_BOXART_95, &length, &lastModified, &needUpdate, &data));
+  EXPECT_EQ(0u, needUpdate);
+  EXPECT_EQ(first.size(), length);
+  EXPECT_EQ(file, Location(VL_WS_BOXART_95, "t1002_"));
+  EXPECT_EQ(2u, Images(2).size());
+
+  // A new picture on the server replaces the file and the row.
+  m_Sim.Store().TouchBoxArt("t1002_");
+  ASSERT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
+  EXPECT_EQ(file, Location(VL_WS_BOXART_95, "t1002_"));
+  ASSERT_EQ(3u, Images(3).size());
+  EXPECT_EQ(200, Images(3)[2].status);
+  EXPECT_EQ(Served("t1002_", VL_WS_BOXART_95), VLReadFile(file));
+  EXPECT_NE(first, VLReadFile(file));
+  std::string newModified;
+  ASSERT_TRUE(ReadRow("t1002_", VL_WS_BOXART_95, &length, &newModified, &needUpdate, &data));
+  EXPECT_NE(lastModified, newModified);
+  EXPECT_EQ(0u, needUpdate);
+}
+
+TEST_F(BoxArt, SizeWordsAndPrefixesReachPathAndFileName) {
+  Init(2);
+  std::string file = m_Dir / "night owl_135.jpg";
+  EXPECT_EQ(file, Location(VL_WS_BOXART_135S, "night owl_"));
+  ASSERT_EQ(1u, Images(1).size());
+  EXPECT_EQ("/images/boxart/135s/night%20owl_135.jpg", Images(1)[0].path);
+  EXPECT_EQ(Served("night owl_", VL_WS_BOXART_135S), VLReadFile(file));
+}
+
+TEST_F(BoxArt, WithoutAnImageTheAnswerIsItsUrlAndNothingIsLeftBehind) {
+  Init(2);
+  EXPECT_EQ("http://images.ostrel.example/images/boxart/175/no%20such_175.jpg", Location(VL_WS_BOXART_175, "no such_"));
+  ASSERT_EQ(1u, Images(1).size());
+  EXPECT_EQ(404, Images(1)[0].status);
+
+  // A download cut in the middle leaves neither the image nor its temporary file.
+  std::string error;
+  ASSERT_TRUE(m_Sim.AddFault("/images/boxart/=cut,times=1", &error)) << error;
+  EXPECT_EQ("http://images.ostrel.example/images/boxart/203/t1003_203.jpg", Location(VL_WS_BOXART_203, "t1003_"));
+  EXPECT_TRUE(ImageFolderFiles(m_Dir.path()).empty());
+  unsigned int length = 0, needUpdate = 0;
+  std::string lastModified, data;
+  EXPECT_FALSE(ReadRow("t1003_", VL_WS_BOXART_203, &length, &lastModified, &needUpdate, &data));
+  EXPECT_EQ(m_Dir / "t1003_203.jpg", Location(VL_WS_BOXART_203, "t1003_"));
+}
+
+TEST_F(BoxArt, OnlyAFileCacheMakesLocalFiles) {
+  for (int cacheType : {0, 1}) {
+    SCOPED_TRACE(cacheType);
+    VL_WS_release(&m_Handle);
+    Init(cacheType);
+    EXPECT_EQ("http://images.ostrel.example/images/boxart/95/t1001_95.jpg", Location(VL_WS_BOXART_95, "t1001_"));
+    EXPECT_TRUE(Images(0).empty());
+  }
+}
+
+TEST_F(BoxArt, MemoryCacheKeepsTheBytes) {
+  Init(1);
+  std::string bytes;
+  ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_177, "t1004_", &bytes));
+  EXPECT_EQ(Served("t1004_", VL_WS_BOXART_177), bytes);
+  unsigned int length = 0, needUpdate = 0;
+  std::string lastModified, data;
+  ASSERT_TRUE(ReadRow("t1004_", VL_WS_BOXART_177, &length, &lastModified, &needUpdate, &data));
+  EXPECT_EQ(bytes, data);
+  EXPECT_EQ(bytes.size(), length);
+
+  ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_177, "t1004_", &bytes));
+  EXPECT_EQ(data, bytes);
+  EXPECT_EQ(1u, Images(1).size());
+
+  // Revalidation: 304 keeps the stored bytes, a new picture replaces them.
+  ASSERT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
+  ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_177, "t1004_", &bytes));
+  EXPECT_EQ(data, bytes);
+  ASSERT_EQ(2u, Images(2).size());
+  EXPECT_EQ(304, Images(2)[1].status);
+  m_Sim.Store().TouchBoxArt("t1004_");
+  ASSERT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
+  ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_177, "t1004_", &bytes));
+  EXPECT_EQ(Served("t1004_", VL_WS_BOXART_177), bytes);
+  EXPECT_NE(data, bytes);
+  ASSERT_TRUE(ReadRow("t1004_", VL_WS_BOXART_177, &length, &lastModified, &needUpdate, &data));
+  EXPECT_EQ(bytes, data);
+  EXPECT_EQ(3u, Images(3).size());
+}
+
+TEST_F(BoxArt, FileCacheGivesTheFilesBytes) {
+  Init(2);
+  std::string bytes;
+  ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_269, "t1005_", &bytes));
+  EXPECT_EQ(Served("t1005_", VL_WS_BOXART_269), bytes);
+  EXPECT_EQ(bytes, VLReadFile(m_Dir / "t1005_269.jpg"));
+  ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_269, "t1005_", &bytes));
+  EXPECT_EQ(Served("t1005_", VL_WS_BOXART_269), bytes);
+  EXPECT_EQ(1u, Images(1).size());
+  // The same image through both operations: one file.
+  EXPECT_EQ(m_Dir / "t1005_269.jpg", Location(VL_WS_BOXART_269, "t1005_"));
+  EXPECT_EQ(1u, Images(1).size());
+}
+
+TEST_F(BoxArt, WithoutACacheEveryCallDownloads) {
+  Init(0);
+  std::string bytes;
+  ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_321, "t1006_", &bytes));
+  EXPECT_EQ(Served("t1006_", VL_WS_BOXART_321), bytes);
+  ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_321, "t1006_", &bytes));
+  EXPECT_EQ(2u, Images(2).size());
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Data(VL_WS_BOXART_321, "no such_", &bytes));
+  EXPECT_EQ("", bytes);
+}
+
+TEST_F(BoxArt, ImagesBypassTheProxy) {
+  // A proxy that is not there: SOAP calls fail, images still come.
+  std::string proxy = "127.0.0.1";
+  Init(1, proxy.c_str(), VLClosedPort());
+  std::string bytes;
+  EXPECT_EQ(VL_WS_OK, Data(VL_WS_BOXART_65, "t1007_", &bytes));
+  EXPECT_EQ(Served("t1007_", VL_WS_BOXART_65), bytes);
+  EXPECT_STREQ("127.0.0.1", m_Handle.client->m_RealTimeBrowse.proxy_host);
+  VL_WS_String time;
+  EXPECT_EQ(VL_WS_E_CONNECT, VL_WS_getLastCacheLoadTimeUTC(&m_Handle, &time));
+  VL_WS_release(&time);
+}
+
+TEST_F(BoxArt, RequestsNamingNoImageAreRefused) {
+  Init(2);
+  VL_WS_String location;
+  VL_WS_Image image;
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(&m_Handle, VL_WS_BOXART_95, "", &location));
+  EXPECT_EQ(VL_WS_TAG_STRING, *location.tag);
+  VL_WS_release(&location);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(&m_Handle, VL_WS_BOXART_95, nullptr, &location));
+  VL_WS_release(&location);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT,
+            VL_WS_getBoxArtImage(&m_Handle, static_cast<VL_WS_BoxArtSize>(13), "t1001_", &location));
+  VL_WS_release(&location);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImageData(&m_Handle, VL_WS_BOXART_95, "", &image));
+  EXPECT_EQ(VL_WS_TAG_IMAGE, *image.tag);
+  EXPECT_EQ(nullptr, image.Data);
+  VL_WS_release(&image);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT,
+            VL_WS_getBoxArtImageData(&m_Handle, static_cast<VL_WS_BoxArtSize>(-1), "t1001_", &image));
+  VL_WS_release(&image);
+  VL_WS_Handle empty = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImageData(&empty, VL_WS_BOXART_95, "t1001_", &image));
+  VL_WS_release(&image);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(nullptr, VL_WS_BOXART_95, "t1001_", &location));
+  VL_WS_release(&location);
+  EXPECT_TRUE(Images(0).empty());
+}
+
+}  // namespace
