@@ -82,6 +82,22 @@ AEString OldReleaseSettingsFile(const char* path) {
   return AEString(renamed.c_str(), renamed.length());
 }
 
+// init's choice of a file: the value of the environment variable name when it is set (printed
+// with label), else path as it was; when that is empty, fallback (logged, the line ending with
+// end).
+void PathFromEnvironment(const AEString& name, const char* label, const char* fallback, const char* end,
+                         AEString& path) {
+  if (const char* value = getenv(name.CString())) {
+    path.Set(value);
+    printf("[VL_FLASH]\n %s = %s \n", label, value);
+  }
+  if (path.IsEmpty()) {
+    VLLogOutputwithConfig(Trace(), "VLCfgLibAE::init environment variable (%s) is not set! Use \"%s\"%s\n",
+                          name.CString(), fallback, end);
+    path.Set(fallback);
+  }
+}
+
 // A setting's argument: the argument at index of a call as text.
 AEString TextArgument(ae::stagecraft::ASValueArray& arguments, size_t index) { return arguments.Get(index).AsString(); }
 
@@ -123,24 +139,8 @@ void VLCfgLibAE::init(StageWindow*, ASObject&, ASValueArray& arguments, ASValue&
   AEString settingsVar = TextArgument(arguments, 1);
   VLLogOutputwithConfig(Trace(), "VLCfgLibAE::init (%s, %s)\n", configVar.CString(), settingsVar.CString());
 
-  if (const char* path = getenv(configVar.CString())) {
-    m_ConfigurationFile.Set(path);
-    printf("[VL_FLASH]\n m_ConfigurationFile = %s \n", path);
-  }
-  if (m_ConfigurationFile.IsEmpty()) {
-    VLLogOutputwithConfig(Trace(), "VLCfgLibAE::init environment variable (%s) is not set! Use \"./ffcredentials.xml\".\n",
-        configVar.CString());
-    m_ConfigurationFile.Set("./ffcredentials.xml");
-  }
-  if (const char* path = getenv(settingsVar.CString())) {
-    m_SettingsFile.Set(path);
-    printf("[VL_FLASH]\n m_SettingsFile = %s \n", path);
-  }
-  if (m_SettingsFile.IsEmpty()) {
-    VLLogOutputwithConfig(Trace(), "VLCfgLibAE::init environment variable (%s) is not set! Use \"./ffpreference.xml\"\n",
-        settingsVar.CString());
-    m_SettingsFile.Set("./ffpreference.xml");
-  }
+  PathFromEnvironment(configVar, "m_ConfigurationFile", "./ffcredentials.xml", ".", m_ConfigurationFile);
+  PathFromEnvironment(settingsVar, "m_SettingsFile", "./ffpreference.xml", "", m_SettingsFile);
   fflush(stdout);
   m_BaseSettingsFile = m_SettingsFile;
 

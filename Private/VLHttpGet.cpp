@@ -47,6 +47,7 @@ bool VLHttpGet::SplitURL(const char* url, VLHttpURL* parts) {
     if (!ParseNumber(digits, 5, &number) || number > 65535) return false;
     port = static_cast<int>(number);
   }
+  parts->authority.assign(host, static_cast<size_t>(slash - host));
   parts->host.assign(host, static_cast<size_t>(hostEnd - host));
   parts->port = port;
   parts->path = slash + 1;

@@ -17,6 +17,7 @@
 
 // The parts of an absolute URL "scheme://host[:port]/path".
 struct VLHttpURL {
+  VLString authority;  // the text between "//" and the next "/": host and port as written
   VLString host;
   int port;       // the URL's port; without one 443 for "https:" URLs (any letter case), else 80
   VLString path;  // the text after the "/" that ends the host

@@ -150,9 +150,12 @@ TEST_F(CfgMovie, EncryptedValuesAreStoredEncryptedAndNeverLogged) {
 
 class CfgUpgrade : public CfgMovie {
  protected:
-  // A settings file of XMLVersion settingsVersion with a token, an identifier and a preference,
-  // and a configuration file of XMLVersion configVersion (each version left out when empty).
+  // New files: a settings file of XMLVersion settingsVersion with a token, an identifier and a
+  // preference, and a configuration file of XMLVersion configVersion (each version left out
+  // when empty).
   void Prepare(const char* settingsVersion, const char* configVersion) {
+    VL_WS_removeFile(Path("ffpreference.xml").c_str());
+    VL_WS_removeFile(Path("ffcredentials.xml").c_str());
     if (*settingsVersion) Put(Path("ffpreference.xml"), "XMLVersion", settingsVersion);
     Put(Path("ffpreference.xml"), "AuthToken", "token-4711", true);
     Put(Path("ffpreference.xml"), "DestinationUniqueID", "00-11-22-33-44-55");
@@ -203,8 +206,6 @@ TEST_F(CfgUpgrade, AFirstStartGetsAVersionAndANewIdentifier) {
 TEST_F(CfgUpgrade, EqualOlderOrMissingConfigurationVersionsChangeNothing) {
   const char* cases[][2] = {{"1.3", "1.3"}, {"1.4", "1.3"}, {"1.9", "1.10"}, {"1.3", ""}};
   for (const auto& c : cases) {
-    VL_WS_removeFile(Path("ffpreference.xml").c_str());
-    VL_WS_removeFile(Path("ffcredentials.xml").c_str());
     Prepare(c[0], c[1]);
     Init();
     EXPECT_TRUE(Unchanged()) << c[0] << " / " << c[1];
@@ -216,8 +217,6 @@ TEST_F(CfgUpgrade, AnInvalidVersionInEitherFileChangesNothing) {
   const char* cases[][3] = {{"1.2", "1..3", "1..3"}, {"1..2", "1.3", "1..2"}, {"1.2", "1.3a", "1.3a"},
                             {"v1", "1.3", "v1"}};
   for (const auto& c : cases) {
-    VL_WS_removeFile(Path("ffpreference.xml").c_str());
-    VL_WS_removeFile(Path("ffcredentials.xml").c_str());
     Prepare(c[0], c[1]);
     Init();
     EXPECT_TRUE(Unchanged()) << c[0] << " / " << c[1];

@@ -17,6 +17,20 @@
 
 namespace {
 
+// The library reads VLWS_CONNECT_TO at its first connection: the simulator starts before any
+// test connects.
+class SimulatorFirst : public testing::Environment {
+ public:
+  void SetUp() override { VLTestSimulator(); }
+};
+testing::Environment* const s_Simulator = testing::AddGlobalTestEnvironment(new SimulatorFirst);
+
+// A port on which nothing listens.
+int ClosedPort() {
+  VLTestServer gone;
+  return gone.Port();
+}
+
 // ---- VLHttpGet ----
 
 // A context as the library's plain requests use it, with short time-outs.
@@ -103,12 +117,7 @@ TEST_F(HttpGet, OtherAnswersAreNamed) {
 }
 
 TEST_F(HttpGet, ConnectionFailures) {
-  int closedPort;
-  {
-    VLTestServer gone;
-    closedPort = gone.Port();
-  }
-  EXPECT_EQ(VLHttpGet::HTTP_CONNECT_FAILED, Run(closedPort));
+  EXPECT_EQ(VLHttpGet::HTTP_CONNECT_FAILED, Run(ClosedPort()));
   m_Server.SetBehaviour(VLTestServer::kCloseAtOnce);
   EXPECT_NE(VLHttpGet::HTTP_OK, Run(m_Server.Port()));
 }
@@ -122,6 +131,7 @@ TEST(HttpURL, SplitsHostPortAndPath) {
   ASSERT_TRUE(VLHttpGet::SplitURL("HTTPS://store.ostrel.example/api/RealTimeBrowse.asmx", &parts));
   EXPECT_EQ(443, parts.port);
   ASSERT_TRUE(VLHttpGet::SplitURL("http://127.0.0.1:8080/p", &parts));
+  EXPECT_STREQ("127.0.0.1:8080", parts.authority.c_str());
   EXPECT_STREQ("127.0.0.1", parts.host.c_str());
   EXPECT_EQ(8080, parts.port);
   for (const char* bad : {"http://host", "http://host/", "images.ostrel.example/probe", "http:///probe",
@@ -132,20 +142,12 @@ TEST(HttpURL, SplitsHostPortAndPath) {
 
 // ---- Operations against the simulator ----
 
-class Device : public testing::Test {
+class Device : public VLSimTest {
  protected:
-  void SetUp() override {
-    m_Sim.ClearFaults();
-    m_Sim.ClearRequests();
-  }
   void TearDown() override {
     VL_WS_release(&m_Handle);
-    m_Sim.ClearFaults();
     m_Sim.Store().SetNow(time(nullptr));
-  }
-  void Fault(const std::string& spec) {
-    std::string error;
-    ASSERT_TRUE(m_Sim.AddFault(spec, &error)) << error;
+    VLSimTest::TearDown();
   }
   void Init() {
     VL_WS_SetupParams params = VLTestSetupParams();
@@ -155,25 +157,18 @@ class Device : public testing::Test {
     ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
   }
 
-  VLSimServer& m_Sim = VLTestSimulator();
   VL_WS_Handle m_Handle = {};
 };
 
-time_t UTC(int year, int month, int day, int hour, int minute, int second) {
-  struct tm t = {};
-  t.tm_year = year - 1900;
-  t.tm_mon = month - 1;
-  t.tm_mday = day;
-  t.tm_hour = hour;
-  t.tm_min = minute;
-  t.tm_sec = second;
-  return timegm(&t);
-}
+// Times of the store's clock, as seconds since 1970 UTC.
+const time_t k20101231_235959 = 1293839999;
+const time_t k20110101_000500 = 1293840300;
+const time_t k20110615_123000 = 1308141000;
+const time_t k20110615_010203 = 1308099723;
 
 TEST_F(Device, ServerTimeReadsTheStoresTwelveHourClock) {
   // 11:59:59 PM, 12:05:00 AM, 12:30:00 PM and 1:02:03 AM
-  for (time_t now : {UTC(2010, 12, 31, 23, 59, 59), UTC(2011, 1, 1, 0, 5, 0), UTC(2011, 6, 15, 12, 30, 0),
-                     UTC(2011, 6, 15, 1, 2, 3)}) {
+  for (time_t now : {k20101231_235959, k20110101_000500, k20110615_123000, k20110615_010203}) {
     m_Sim.Store().SetNow(now);
     time_t got = 0;
     EXPECT_EQ(VL_WS_OK, VL_WS_getServerTime(&got));
@@ -198,7 +193,7 @@ TEST_F(Device, ServerTimeFailuresLeaveTheTimeUnknown) {
       {"/device/time/=truncated,times=1", VL_WS_E_UNEXPECTED},  // "12/31/2010 " has three fields
       {"/device/time/=badlength:64,times=1", VL_WS_E_UNEXPECTED},
   };
-  m_Sim.Store().SetNow(UTC(2010, 12, 31, 23, 59, 59));
+  m_Sim.Store().SetNow(k20101231_235959);
   for (const auto& c : cases) {
     Fault(c.fault);
     time_t got = 0;
@@ -220,12 +215,7 @@ TEST_F(Device, LocalAddressIsTheLocalEndOfAConnectionToTheService) {
   base = "https://no-path-here";
   EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getLocalIPAddr(&m_Handle, &address));
   VL_WS_release(&address);
-  int closedPort;
-  {
-    VLTestServer gone;
-    closedPort = gone.Port();
-  }
-  base = ("http://127.0.0.1:" + std::to_string(closedPort) + "/api/").c_str();
+  base = ("http://127.0.0.1:" + std::to_string(ClosedPort()) + "/api/").c_str();
   EXPECT_EQ(VL_WS_E_CONNECT, VL_WS_getLocalIPAddr(&m_Handle, &address));
   EXPECT_EQ(nullptr, address.Text);
   VL_WS_release(&address);

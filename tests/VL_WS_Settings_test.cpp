@@ -158,16 +158,26 @@ TEST(EnvXML, CreateCopiesOnlyWhenTheDestinationIsMissing) {
   EXPECT_EQ(VL_WS_OK, VL_WS_createEnvXML(source.c_str(), destination.c_str()));
   EXPECT_EQ("<mine/>", VLReadFile(destination));
 
-  std::string other = dir / "other.xml";
-  EXPECT_EQ(VL_WS_E_FILE, VL_WS_createEnvXML((dir / "missing.xml").c_str(), other.c_str()));
-  EXPECT_FALSE(Exists(other));
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_createEnvXML(nullptr, other.c_str()));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_createEnvXML(nullptr, destination.c_str()));
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_createEnvXML(source.c_str(), nullptr));
 
   EXPECT_EQ(VL_WS_OK, VL_WS_deleteEnvXML(destination.c_str()));
   EXPECT_FALSE(Exists(destination));
   EXPECT_EQ(VL_WS_OK, VL_WS_deleteEnvXML(destination.c_str()));
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_deleteEnvXML(nullptr));
+}
+
+TEST(FileHelpers, AFailedCopyLeavesNoNewDestination) {
+  VLTestDir dir;
+  std::string missing = dir / "missing.xml", destination = dir / "destination.xml";
+  for (auto copy : {VL_WS_copyFile, VL_WS_createEnvXML}) {
+    EXPECT_EQ(VL_WS_E_FILE, copy(missing.c_str(), destination.c_str()));
+    EXPECT_FALSE(Exists(destination));
+  }
+  // A source that cannot be read to its end: a folder opens, but every read fails.
+  ASSERT_EQ(VL_WS_OK, VL_WS_createFolder((dir / "folder").c_str()));
+  EXPECT_EQ(VL_WS_E_FILE, VL_WS_copyFile((dir / "folder").c_str(), destination.c_str()));
+  EXPECT_FALSE(Exists(destination));
 }
 
 TEST(Md5sum, GivesTheCommandsOutput) {
@@ -213,10 +223,7 @@ TEST(FileHelpers, RemoveAndCopy) {
   EXPECT_EQ("content", VLReadFile(copy));
   EXPECT_EQ(VL_WS_E_FILE, VL_WS_copyFile(file.c_str(), file.c_str()));
   EXPECT_EQ("content", VLReadFile(file));
-  std::string none = dir / "none.xml";
-  EXPECT_EQ(VL_WS_E_FILE, VL_WS_copyFile((dir / "missing.xml").c_str(), none.c_str()));
-  EXPECT_FALSE(Exists(none));
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_copyFile(nullptr, none.c_str()));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_copyFile(nullptr, copy.c_str()));
 
   EXPECT_EQ(VL_WS_OK, VL_WS_removeFile(copy.c_str()));
   EXPECT_FALSE(Exists(copy));

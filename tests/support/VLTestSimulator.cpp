@@ -37,3 +37,15 @@ VL_WS_SetupParams VLTestSetupParams() {
   params.AccessType = STREAM;
   return params;
 }
+
+void VLSimTest::SetUp() {
+  m_Sim.ClearFaults();
+  m_Sim.ClearRequests();
+}
+
+void VLSimTest::TearDown() { m_Sim.ClearFaults(); }
+
+void VLSimTest::Fault(const std::string& spec) {
+  std::string error;
+  ASSERT_TRUE(m_Sim.AddFault(spec, &error)) << error;
+}

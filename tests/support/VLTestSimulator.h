@@ -3,6 +3,10 @@
 #ifndef VLTESTSIMULATOR_H
 #define VLTESTSIMULATOR_H
 
+#include <gtest/gtest.h>
+
+#include <string>
+
 #include "VLSimServer.h"
 #include "VL_WS.h"
 
@@ -16,5 +20,17 @@ VLSimServer& VLTestSimulator();
 // "00-11-22-33-44-55" of type 7, the general catalogue in production, access type STREAM (no
 // question to the store), no cache and no proxy. The strings are static.
 VL_WS_SetupParams VLTestSetupParams();
+
+// A test against the program's simulator: it starts without faults and with an empty request
+// log, and leaves no faults behind.
+class VLSimTest : public testing::Test {
+ protected:
+  void SetUp() override;
+  void TearDown() override;
+  // Adds a fault in its written form (VLSimFaults.h); a fault that does not parse fails the test.
+  void Fault(const std::string& spec);
+
+  VLSimServer& m_Sim = VLTestSimulator();
+};
 
 #endif  // VLTESTSIMULATOR_H
