@@ -18,17 +18,33 @@ class VL1__ArrayOfTitleListing;
 class VL1__ArrayOfTitleListingPurchasedForPass;
 class VL1__ArrayOfTitleListingResponse;
 class VL1__AuthorizeDeviceResponse;
+class VL1__BillingInfoAndPPCBalanceResponse;
+class VL1__BillingInfoResponse;
+class VL1__CalcOrderTaxResponse;
+class VL1__CheckAdultVerificationEnabledResponse;
+class VL1__CheckAdultVerificationPinResponse;
+class VL1__CheckRentalExpirationResponse;
+class VL1__GetConfigResponse;
+class VL1__GetEmailAddressResponse;
+class VL1__GetGenreLabelResponse;
 class VL1__GetMyVideosResponse;
 class VL1__GetStreamingAssetLocationResponse;
 class VL1__GetTitlesResponse;
 class VL1__GetWishlistItemsResponse;
+class VL1__GiftCertificateResponse;
+class VL1__PPCardBalanceResponse;
+class VL1__PurchaseResponse;
 class VL1__RecommendedTitlesResponse;
+class VL1__SettingsPageInfo;
 class VL1__StandardResponse;
+class VL1__THXMediaDirectorResponse;
 class VL1__TitleListing;
 class VL1__TitleListingPurchased;
 class VL1__TitleListingResponse;
+class VL1__TranslateSkuIdResponse;
 class VL1__TranslatedTivoExternalIdResponse;
 class VL1__TvEpisodeList;
+class VL1__WishListActionResponse;
 
 class VLUtilities {
  public:
@@ -104,10 +120,14 @@ class VLUtilities {
   static void VL1__RecommendedTitlesResponse2VL_WS_RecommendedTitlesResponse(
       const VL1__RecommendedTitlesResponse* t, VL_WS_RecommendedTitlesResponse& r);
   static void VL1__ArrayOfGenre2VL_WS_GenreArray(const VL1__ArrayOfGenre* t, VL_WS_GenreArray& r);
+  static void VL1__GetGenreLabelResponse2VL_WS_GenreLabelResponse(const VL1__GetGenreLabelResponse* t,
+                                                                 VL_WS_GenreLabelResponse& r);
   static void VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse(const VL1__TvEpisodeList* t,
                                                              VL_WS_TvEpisodeListResponse& r);
   static void VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExternalIDResponse(
       const VL1__TranslatedTivoExternalIdResponse* t, VL_WS_TranslateTivoExternalIDResponse& r);
+  static void VL1__TranslateSkuIdResponse2VL_WS_TranslateSkuIDResponse(const VL1__TranslateSkuIdResponse* t,
+                                                                       VL_WS_TranslateSkuIDResponse& r);
   // The purchase fields and the title fields.
   static void VL1__TitleListingPurchased2VL_WS_TitleListingPurchased(
       const VL1__TitleListingPurchased* t, VL_WS_TitleListingPurchased& r);
@@ -122,6 +142,38 @@ class VLUtilities {
       const VL1__AuthorizeDeviceResponse* t, VL_WS_AuthorizeDeviceResponse& r);
   static void VL1__GetStreamingAssetLocationResponse2VL_WS_StreamingAssetLocationResponse(
       const VL1__GetStreamingAssetLocationResponse* t, VL_WS_StreamingAssetLocationResponse& r);
+  static void VL1__THXMediaDirectorResponse2VL_WS_THXMediaDirectorResponse(
+      const VL1__THXMediaDirectorResponse* t, VL_WS_THXMediaDirectorResponse& r);
+  // The wishlist changes answer a code and a message outside the standard response type.
+  static void VL1__WishListActionResponse2VL_WS_StandardResponse(const VL1__WishListActionResponse* t,
+                                                                 VL_WS_StandardResponse& r);
+  static void VL1__PurchaseResponse2VL_WS_PurchaseResponse(const VL1__PurchaseResponse* t,
+                                                           VL_WS_PurchaseResponse& r);
+  static void VL1__CalcOrderTaxResponse2VL_WS_OrderTaxResponse(const VL1__CalcOrderTaxResponse* t,
+                                                               VL_WS_OrderTaxResponse& r);
+  static void VL1__BillingInfoResponse2VL_WS_BillingInfoResponse(const VL1__BillingInfoResponse* t,
+                                                                 VL_WS_BillingInfoResponse& r);
+  static void VL1__PPCardBalanceResponse2VL_WS_PrePaidCardBalanceResponse(
+      const VL1__PPCardBalanceResponse* t, VL_WS_PrePaidCardBalanceResponse& r);
+  // Each part that the answer holds; a missing part stays empty.
+  static void VL1__BillingInfoAndPPCBalanceResponse2VL_WS_BillingInfoAndPPCBalance(
+      const VL1__BillingInfoAndPPCBalanceResponse* t, VL_WS_BillingInfoAndPPCBalance& r);
+  static void VL1__GiftCertificateResponse2VL_WS_GiftCertificateResponse(
+      const VL1__GiftCertificateResponse* t, VL_WS_GiftCertificateResponse& r);
+  static void VL1__GetEmailAddressResponse2VL_WS_EmailAddressResponse(
+      const VL1__GetEmailAddressResponse* t, VL_WS_EmailAddressResponse& r);
+  static void VL1__SettingsPageInfo2VL_WS_SettingsPageResponse(const VL1__SettingsPageInfo* t,
+                                                               VL_WS_SettingsPageResponse& r);
+  // One item (Key, Value) per configuration element of the answer.
+  static void VL1__GetConfigResponse2VL_WS_ConfigResponse(const VL1__GetConfigResponse* t,
+                                                          VL_WS_ConfigResponse& r);
+  // IsAdultVerificationEnabled as for the authorisation answer.
+  static void VL1__CheckAdultVerificationEnabledResponse2VL_WS_AdultVerificationEnabledResponse(
+      const VL1__CheckAdultVerificationEnabledResponse* t, VL_WS_AdultVerificationEnabledResponse& r);
+  static void VL1__CheckAdultVerificationPinResponse2VL_WS_AdultVerificationPinResponse(
+      const VL1__CheckAdultVerificationPinResponse* t, VL_WS_AdultVerificationPinResponse& r);
+  static void VL1__CheckRentalExpirationResponse2VL_WS_RentalExpirationResponse(
+      const VL1__CheckRentalExpirationResponse* t, VL_WS_RentalExpirationResponse& r);
 
   // ---- Box art and images (VLUtilities_BoxArt.cpp) --------------------------------------------
 

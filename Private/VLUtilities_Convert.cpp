@@ -189,6 +189,14 @@ void VLUtilities::VL1__ArrayOfGenre2VL_WS_GenreArray(const VL1__ArrayOfGenre* t,
   });
 }
 
+void VLUtilities::VL1__GetGenreLabelResponse2VL_WS_GenreLabelResponse(const VL1__GetGenreLabelResponse* t,
+                                                                     VL_WS_GenreLabelResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.Label = Text(t->Label);
+  r.LabelMessage = Text(t->LabelMessage);
+}
+
 void VLUtilities::VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse(const VL1__TvEpisodeList* t,
                                                                  VL_WS_TvEpisodeListResponse& r) {
   VL_ASSERT(t != 0);
@@ -202,6 +210,13 @@ void VLUtilities::VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExtern
   r.TivoExternalId = Text(t->TivoExternalId);
   r.TitleId = t->TitleId;
   VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+}
+
+void VLUtilities::VL1__TranslateSkuIdResponse2VL_WS_TranslateSkuIDResponse(const VL1__TranslateSkuIdResponse* t,
+                                                                           VL_WS_TranslateSkuIDResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.TitleId = t->TitleId;
 }
 
 void VLUtilities::VL1__TitleListingPurchased2VL_WS_TitleListingPurchased(
@@ -271,4 +286,117 @@ void VLUtilities::VL1__GetStreamingAssetLocationResponse2VL_WS_StreamingAssetLoc
   r.StartTimeSeconds = t->StartTimeSeconds;
   r.HeartbeatURL = Text(t->HeartbeatURL);
   r.HeartbeatPollInSeconds = t->HeartbeatPollInSeconds;
+}
+
+void VLUtilities::VL1__THXMediaDirectorResponse2VL_WS_THXMediaDirectorResponse(
+    const VL1__THXMediaDirectorResponse* t, VL_WS_THXMediaDirectorResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.LongFormat = Text(t->LongFormat);
+  r.ShortFormat = Text(t->ShortFormat);
+}
+
+void VLUtilities::VL1__WishListActionResponse2VL_WS_StandardResponse(const VL1__WishListActionResponse* t,
+                                                                     VL_WS_StandardResponse& r) {
+  VL_ASSERT(t != 0);
+  r.ResponseCode = t->ResponseCode;
+  r.ResponseMessage = Text(t->ResponseMessage);
+}
+
+void VLUtilities::VL1__PurchaseResponse2VL_WS_PurchaseResponse(const VL1__PurchaseResponse* t,
+                                                               VL_WS_PurchaseResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.PassID = t->PassID;
+  r.TransactionId = t->TransactionId;
+  r.TransactionAuthNum = Text(t->TransactionAuthNum);
+}
+
+void VLUtilities::VL1__CalcOrderTaxResponse2VL_WS_OrderTaxResponse(const VL1__CalcOrderTaxResponse* t,
+                                                                   VL_WS_OrderTaxResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.SubTotal = Text(t->SubTotal);
+  r.TotalPrice = Text(t->TotalPrice);
+  r.Tax = Text(t->Tax);
+}
+
+void VLUtilities::VL1__BillingInfoResponse2VL_WS_BillingInfoResponse(const VL1__BillingInfoResponse* t,
+                                                                     VL_WS_BillingInfoResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.CCLastFour = Text(t->CCLastFour);
+  r.CCTypeId = t->CCTypeId;
+  r.CCType = Text(t->CCType);
+}
+
+void VLUtilities::VL1__PPCardBalanceResponse2VL_WS_PrePaidCardBalanceResponse(
+    const VL1__PPCardBalanceResponse* t, VL_WS_PrePaidCardBalanceResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.Balance = t->Balance;
+}
+
+void VLUtilities::VL1__BillingInfoAndPPCBalanceResponse2VL_WS_BillingInfoAndPPCBalance(
+    const VL1__BillingInfoAndPPCBalanceResponse* t, VL_WS_BillingInfoAndPPCBalance& r) {
+  VL_ASSERT(t != 0);
+  if (t->BillingInfo != 0) VL1__BillingInfoResponse2VL_WS_BillingInfoResponse(t->BillingInfo, r.BillingInfo);
+  if (t->PPCardBalance != 0) VL1__PPCardBalanceResponse2VL_WS_PrePaidCardBalanceResponse(t->PPCardBalance, r.PPCardBalance);
+}
+
+void VLUtilities::VL1__GiftCertificateResponse2VL_WS_GiftCertificateResponse(
+    const VL1__GiftCertificateResponse* t, VL_WS_GiftCertificateResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.Balance = t->Balance;
+}
+
+void VLUtilities::VL1__GetEmailAddressResponse2VL_WS_EmailAddressResponse(
+    const VL1__GetEmailAddressResponse* t, VL_WS_EmailAddressResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.EmailAddress = Text(t->EmailAddress);
+}
+
+void VLUtilities::VL1__SettingsPageInfo2VL_WS_SettingsPageResponse(const VL1__SettingsPageInfo* t,
+                                                                   VL_WS_SettingsPageResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.Account = Text(t->Account);
+  r.DeviceID = Text(t->DeviceID);
+  r.DeviceName = Text(t->DeviceName);
+}
+
+void VLUtilities::VL1__GetConfigResponse2VL_WS_ConfigResponse(const VL1__GetConfigResponse* t,
+                                                              VL_WS_ConfigResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  if (t->ConfigurationSet == 0) return;
+  ConvertItems(t->ConfigurationSet->Configuration, t->ConfigurationSet->__sizeConfiguration, r,
+               [](const VL1__ConfigurationItemOfString* a, VL_WS_ConfigurationItem& b) {
+                 b.Key = Text(a->Key);
+                 b.Value = Text(a->Value);
+               });
+}
+
+void VLUtilities::VL1__CheckAdultVerificationEnabledResponse2VL_WS_AdultVerificationEnabledResponse(
+    const VL1__CheckAdultVerificationEnabledResponse* t, VL_WS_AdultVerificationEnabledResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.IsAdultVerificationEnabled = Str2Bool(t->IsAdultVerificationEnabled);
+}
+
+void VLUtilities::VL1__CheckAdultVerificationPinResponse2VL_WS_AdultVerificationPinResponse(
+    const VL1__CheckAdultVerificationPinResponse* t, VL_WS_AdultVerificationPinResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.IsPinVerified = Bool(t->IsPinVerified);
+}
+
+void VLUtilities::VL1__CheckRentalExpirationResponse2VL_WS_RentalExpirationResponse(
+    const VL1__CheckRentalExpirationResponse* t, VL_WS_RentalExpirationResponse& r) {
+  VL_ASSERT(t != 0);
+  VL1__StandardResponse2VL_WS_StandardResponse(t, r);
+  r.ShouldDisplay = Bool(t->ShouldDisplay);
+  r.HoursRemaining = t->HoursRemaining;
 }

@@ -137,9 +137,7 @@ bool ValidImage(const char* prefix, VL_WS_BoxArtSize size) {
 
 extern "C" VL_WS_Status VL_WS_getBoxArtImage(VL_WS_Handle* handle, VL_WS_BoxArtSize size, const char* prefix,
                                              VL_WS_String* location) {
-  if (location == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLRecordInit(*location);
-  VL_WS_Client* client = VLClientOf(handle);
+  VL_WS_Client* client = VLClientFor(handle, location);
   if (client == 0 || !ValidImage(prefix, size)) return VL_WS_E_INVALID_ARGUMENT;
 
   BoxArtRequest request(client, prefix, size);
@@ -154,9 +152,7 @@ extern "C" VL_WS_Status VL_WS_getBoxArtImage(VL_WS_Handle* handle, VL_WS_BoxArtS
 
 extern "C" VL_WS_Status VL_WS_getBoxArtImageData(VL_WS_Handle* handle, VL_WS_BoxArtSize size, const char* prefix,
                                                  VL_WS_Image* image) {
-  if (image == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLRecordInit(*image);
-  VL_WS_Client* client = VLClientOf(handle);
+  VL_WS_Client* client = VLClientFor(handle, image);
   if (client == 0 || !ValidImage(prefix, size)) return VL_WS_E_INVALID_ARGUMENT;
 
   BoxArtRequest request(client, prefix, size);

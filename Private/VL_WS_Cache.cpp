@@ -1,28 +1,24 @@
 // Freshness of a handle's cache: the store's last catalogue load time and the refresh of the
 // cached kinds of data.
+#include "VLCachedCall.h"
 #include "VLRecord.h"
 #include "VLUtilities.h"
 #include "VLWSAELog.h"
 #include "VL_WS.h"
 #include "VL_WS_Client.h"
 
-namespace {
-VLLogArea s_Log(VLWSAELOG_AREA_NAME);
-}  // namespace
+static VLLogArea s_Log(VLWSAELOG_AREA_NAME);
 
 extern "C" VL_WS_Status VL_WS_getLastCacheLoadTimeUTC(VL_WS_Handle* handle, VL_WS_String* utcTime) {
-  if (utcTime == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLRecordInit(*utcTime);
-  VL_WS_Client* client = VLClientOf(handle);
+  VL_WS_Client* client = VLClientFor(handle, utcTime);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
 
-  RealTimeBrowse& service = client->m_RealTimeBrowse;
-  _VL1__getLastCacheLoadTimeUTC* request = soap_new__VL1__getLastCacheLoadTimeUTC(&service);
-  _VL1__getLastCacheLoadTimeUTCResponse* response = soap_new__VL1__getLastCacheLoadTimeUTCResponse(&service);
-  int soapError = request && response ? service.Setup("getLastCacheLoadTimeUTC") : SOAP_EOM;
-  if (soapError == SOAP_OK) soapError = service.getLastCacheLoadTimeUTC(request, response);
-  if (soapError == SOAP_OK) VLRecordSetString(*utcTime, response->getLastCacheLoadTimeUTCResult);
-  VLEndCall(service);
+  int soapError = VLPlainCall(client->m_RealTimeBrowse, "getLastCacheLoadTimeUTC",
+                              soap_new__VL1__getLastCacheLoadTimeUTC, soap_new__VL1__getLastCacheLoadTimeUTCResponse,
+                              &RealTimeBrowse::getLastCacheLoadTimeUTC,
+                              [&](const _VL1__getLastCacheLoadTimeUTCResponse& response) {
+                                VLRecordSetString(*utcTime, response.getLastCacheLoadTimeUTCResult);
+                              });
   VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, ret:%d,utctime:%s\n", "VL_WS_getLastCacheLoadTimeUTC", soapError,
                         utcTime->Text ? utcTime->Text : "");
   return VLUtilities::To_VL_WS_Status(soapError);
@@ -46,4 +42,17 @@ extern "C" VL_WS_Status VL_WS_updateLocalCache(VL_WS_Handle* handle, int dataKin
   if (kinds & VL_WS_CacheParam::CACHE_BOXART) cache->SetBoxArtNeedUpdate();
   if (kinds & VL_WS_CacheParam::CACHE_USERDATA) cache->PurgeUserData(VLString());
   return VL_WS_OK;
+}
+
+extern "C" VL_WS_Status VL_WS_shouldUpdateCache(VL_WS_Handle* handle, const char* utcTime, bool* update) {
+  if (update == 0) return VL_WS_E_INVALID_ARGUMENT;
+  *update = false;
+  VL_WS_Client* client = VLClientOf(handle);
+  if (client == 0 || utcTime == 0 || *utcTime == 0) return VL_WS_E_INVALID_ARGUMENT;
+  int soapError = VLServiceCall(
+      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, shouldUpdateCache),
+      [&](_VL1__shouldUpdateCache& request) { request.UTCTime = const_cast<char*>(utcTime); },
+      [&](int result) { *update = result == 1; });
+  VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, result:%d\n", "VL_WS_shouldUpdateCache", *update);
+  return VLUtilities::To_VL_WS_Status(soapError);
 }

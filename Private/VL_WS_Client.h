@@ -9,6 +9,7 @@
 #include "RealTimeBrowse.h"
 #include "StreamAPI.h"
 #include "StreamDownloadAPI.h"
+#include "VLRecord.h"
 #include "VL_WS_SetupParams2.h"
 #include "VL_WS_Types.h"
 
@@ -25,11 +26,51 @@ struct VL_WS_Client {
 // which every operation refuses with -1000.
 VL_WS_Client* VLClientOf(const VL_WS_Handle* handle);
 
+// The first step of an operation with an out-record: clears and tags the record (before any
+// check, so that the caller can always release it), then gives the handle's client state. Null
+// when the record or the client state is missing; the operation answers -1000 then.
+template <class Record>
+VL_WS_Client* VLClientFor(const VL_WS_Handle* handle, Record* record) {
+  if (record == 0) return 0;
+  VLRecordInit(*record);
+  return VLClientOf(handle);
+}
+
+// Prepares one SOAP call of an operation on a service object (or the dispatcher): makes its
+// request and response records in the service's context with the generated functions
+// newRequest and newResponse (soap_new__VL1__<operation>, ...Response), and the header of the
+// operation (Setup with its SOAP name). Returns SOAP_OK, or the error that ends the call; either
+// way the call ends with VLEndCall.
+template <class Service, class Request, class Response>
+int VLPrepareCall(Service& service, const char* operation, Request* (*newRequest)(soap*, int),
+                  Response* (*newResponse)(soap*, int), Request*& request, Response*& response) {
+  soap& context = service;
+  request = newRequest(&context, -1);
+  response = newResponse(&context, -1);
+  if (request == 0 || response == 0) return SOAP_EOM;
+  return service.Setup(operation);
+}
+
 // Ends one SOAP call on a service context: deletes the call's request and response records and
 // everything else the call allocated in the context (the reply's header and texts included) and
 // ends the context's message state. Nothing of the reply may be used afterwards. Every
 // operation runs it once per call, whatever the call's outcome.
 void VLEndCall(soap& context);
+
+// The plain call of an operation whose request has no fields: prepares the call, calls the
+// service's operation (call, e.g. &RealTimeBrowse::getFileType), lets convert read the response
+// when the call succeeded, and ends the call. Returns the SOAP error.
+template <class Service, class Proxy, class Request, class Response, class Convert>
+int VLPlainCall(Service& service, const char* operation, Request* (*newRequest)(soap*, int),
+                Response* (*newResponse)(soap*, int), int (Proxy::*call)(Request*, Response*), Convert convert) {
+  Request* request;
+  Response* response;
+  int error = VLPrepareCall(service, operation, newRequest, newResponse, request, response);
+  if (error == SOAP_OK) error = (service.*call)(request, response);
+  if (error == SOAP_OK) convert(*response);
+  VLEndCall(service);
+  return error;
+}
 
 // Frees a handle's client state: closes and deletes its cache, then destroys its settings, the
 // dispatcher and the three service objects. VL_WS_release calls it for a handle that has one.

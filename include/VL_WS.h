@@ -114,6 +114,363 @@ VL_WS_Status VL_WS_getDeviceEnv(VL_WS_Handle* handle, VL_WS_EnvID* envID);
  */
 VL_WS_Status VL_WS_getFileType(VL_WS_Handle* handle, VL_WS_FileType* fileType);
 
+/*
+ * Account operations in general
+ *
+ * Unless said otherwise, an account operation goes to the download service when the handle was
+ * made with access type DOWNLOAD and to the streaming service otherwise. It prepares its result
+ * before anything else: a record is cleared and tagged (release it whatever the status), a bool
+ * or int result is set to false or 0. It returns VL_WS_E_INVALID_ARGUMENT for a handle without
+ * client state, a null result pointer, or a required argument that is missing or empty, before
+ * any request.
+ *
+ * A failed call (no connection, TLS, HTTP or SOAP failure) returns its status (VL_WS_E_CONNECT,
+ * VL_WS_E_EOF, VL_WS_E_TLS, VL_WS_E_HTTP_STATUS(n), VL_WS_E_SOAP_FAULT(n), VL_WS_E_UNEXPECTED)
+ * and leaves the record cleared. An answer without its result leaves the record cleared with
+ * status VL_WS_OK. The store's ResponseCode and ResponseMessage are always in the record; where
+ * an operation says "the code counts", a non-zero code gives VL_WS_E_UNEXPECTED unless the
+ * operation lists its own statuses. Nothing changes in the handle or the cache unless the call
+ * succeeded with ResponseCode 0.
+ */
+
+/*
+ * VL_WS_authorizeDevice - link the device to the store account whose PIN is `pin`.
+ *
+ * On success the handle's token becomes the answer's AuthToken: every later request of this
+ * handle (not of its duplicates) carries it. Keep it and pass it as VL_WS_SetupParams::AuthToken
+ * at the next initialisation. With a cache of user data, all user data of the previous account
+ * are deleted, the wishlist flags included.
+ *
+ * The code counts: VL_WS_E_AUTHORIZE_1 (code 1: wrong PIN), VL_WS_E_AUTHORIZE_2 (code 2).
+ */
+VL_WS_Status VL_WS_authorizeDevice(VL_WS_Handle* handle, int pin, VL_WS_AuthorizeDeviceResponse* answer);
+
+/*
+ * VL_WS_deactivateDevice - unlink the device from its account.
+ *
+ * On success the handle's token becomes empty and, with a cache of user data, all user data are
+ * deleted. The code counts.
+ */
+VL_WS_Status VL_WS_deactivateDevice(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
+
+/*
+ * VL_WS_checkAuthToken - whether the store accepts the handle's token.
+ *
+ * With a cache of user data, the user data are deleted whenever the answer differs from the
+ * previous answer on this handle (a new handle starts from "not valid", so its first "valid"
+ * deletes them once). The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_checkAuthToken(VL_WS_Handle* handle, bool* valid);
+
+/*
+ * VL_WS_getConfig - the store's configuration for the device: key and value texts, in the
+ * store's order (the bandwidth probe's URL among them). The code counts.
+ */
+VL_WS_Status VL_WS_getConfig(VL_WS_Handle* handle, VL_WS_ConfigResponse* config);
+
+/*
+ * VL_WS_getCountryID - the store's number of the account's country. The status is the SOAP
+ * call's.
+ */
+VL_WS_Status VL_WS_getCountryID(VL_WS_Handle* handle, int* countryID);
+
+/*
+ * VL_WS_checkAdultVerificationEnabled - whether adult titles need the account's adult-content
+ * PIN. The code counts.
+ */
+VL_WS_Status VL_WS_checkAdultVerificationEnabled(VL_WS_Handle* handle, VL_WS_AdultVerificationEnabledResponse* answer);
+
+/*
+ * VL_WS_checkAdultVerificationPin - whether `pin` is the account's adult-content PIN. The PIN is
+ * sent as at least four digits ("%04d": 7 is sent as "0007"). The code counts; a wrong PIN is a
+ * successful answer with IsPinVerified false.
+ */
+VL_WS_Status VL_WS_checkAdultVerificationPin(VL_WS_Handle* handle, int pin, VL_WS_AdultVerificationPinResponse* answer);
+
+/*
+ * VL_WS_returnError, VL_WS_returnTimeout - test operations of the streaming service: the store
+ * answers with an error code, or holds its answer past the handle's receive time-out. They always
+ * go to the streaming service. The code counts.
+ */
+VL_WS_Status VL_WS_returnError(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
+VL_WS_Status VL_WS_returnTimeout(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
+
+/* ---------------------------------------------------------------------------------------------
+ * Purchases and billing (account operations: see "Account operations in general")
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_doPurchaseSavedBilling - buy or rent the product `skuID` with the account's saved card,
+ * or with its prepaid funds when `usePrePaidFunds` is true. `ipAddress` (required) is the
+ * client's IP address as text.
+ *
+ * On success the answer holds the new pass (PassID, for the streaming operations) and the
+ * transaction. The store takes a bought title off the wishlist: with a cache of user data, the
+ * cached wishlist pages and every wishlist flag are deleted.
+ *
+ * The code counts: VL_WS_E_PURCHASE_1 to VL_WS_E_PURCHASE_12 for codes 1 to 12 (code n gives
+ * -1006 - n), VL_WS_E_PURCHASE_20, _21 and _22 for codes 20 to 22.
+ */
+VL_WS_Status VL_WS_doPurchaseSavedBilling(VL_WS_Handle* handle, int skuID, const char* ipAddress,
+                                          bool usePrePaidFunds, VL_WS_PurchaseResponse* answer);
+
+/*
+ * VL_WS_calcOrderTax - sub-total, tax and total of buying the product `skuID`, as the store's
+ * decimal texts. Always the streaming service.
+ *
+ * The code counts: VL_WS_E_ORDER_TAX_1, _2, _3, _11, _12 and _20 for codes 1, 2, 3, 11, 12 and 20.
+ */
+VL_WS_Status VL_WS_calcOrderTax(VL_WS_Handle* handle, int skuID, VL_WS_OrderTaxResponse* tax);
+
+/*
+ * VL_WS_getBillingInfoAndPPCBalance - the saved card and the prepaid balance in one answer, each
+ * part with its own code and message (a part the answer lacks stays empty). Always the streaming
+ * service. The code of the billing part counts.
+ */
+VL_WS_Status VL_WS_getBillingInfoAndPPCBalance(VL_WS_Handle* handle, VL_WS_BillingInfoAndPPCBalance* info);
+
+/*
+ * VL_WS_getPrePaidCardBalance - the account's prepaid balance. The code counts.
+ */
+VL_WS_Status VL_WS_getPrePaidCardBalance(VL_WS_Handle* handle, VL_WS_PrePaidCardBalanceResponse* balance);
+
+/*
+ * VL_WS_assignGiftCertificateToUser - redeem the gift certificate `code` (required) for the
+ * account; the answer holds the new balance.
+ *
+ * The code counts: VL_WS_E_GIFT_CERTIFICATE_1 and _2 for codes 1 and 2.
+ */
+VL_WS_Status VL_WS_assignGiftCertificateToUser(VL_WS_Handle* handle, const char* code,
+                                               VL_WS_GiftCertificateResponse* answer);
+
+/*
+ * VL_WS_checkRentalExpiration - whether to warn that the rental of pass `passID` runs out, and
+ * the hours it has left. The code counts.
+ */
+VL_WS_Status VL_WS_checkRentalExpiration(VL_WS_Handle* handle, int passID, VL_WS_RentalExpirationResponse* answer);
+
+/*
+ * VL_WS_checkForPurchasedTitle - whether the account holds a pass for title `titleID`.
+ *
+ * The handle's access type as it stands (VL_WS_getFileType may have changed it) chooses the
+ * service: DOWNLOAD asks the download service, any other type the streaming service. The status
+ * is the SOAP call's.
+ */
+VL_WS_Status VL_WS_checkForPurchasedTitle(VL_WS_Handle* handle, int titleID, bool* purchased);
+
+/*
+ * VL_WS_checkForPurchasedSku - whether the account holds a pass for the product `skuID`. Always
+ * the streaming service. The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_checkForPurchasedSku(VL_WS_Handle* handle, int skuID, bool* purchased);
+
+/*
+ * VL_WS_removeAllMyPurchases - delete every pass of the account; `password` (required) is the
+ * account's password. Always the streaming service. The code counts.
+ */
+VL_WS_Status VL_WS_removeAllMyPurchases(VL_WS_Handle* handle, const char* password, VL_WS_StandardResponse* answer);
+
+/*
+ * VL_WS_getTitleListingPurchaseds - the purchased title of each of the `count` passes in
+ * `passIDs` (both required), each with the store's code and message for its pass. Always the
+ * streaming service. The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_getTitleListingPurchaseds(VL_WS_Handle* handle, int count, const int* passIDs,
+                                             VL_WS_TitleListingPurchasedForPassArray* titles);
+
+/* ---------------------------------------------------------------------------------------------
+ * Wishlist (account operations: see "Account operations in general")
+ *
+ * With a cache of user data (CACHE_USERDATA) the client keeps a flag per title: whether it is on
+ * the wishlist. The changes below keep the flags up to date, and VL_WS_checkTitleInWishlist
+ * answers from them without asking the store.
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_addItemToWishlist, VL_WS_removeItemFromWishlist, VL_WS_removeAllItemsFromWishlist -
+ * change the wishlist. On success, with a cache of user data, the cached wishlist pages are
+ * deleted and the title's flag is set (added: true, removed: false), or every flag is deleted.
+ * The code counts.
+ */
+VL_WS_Status VL_WS_addItemToWishlist(VL_WS_Handle* handle, int titleID, VL_WS_StandardResponse* answer);
+VL_WS_Status VL_WS_removeItemFromWishlist(VL_WS_Handle* handle, int titleID, VL_WS_StandardResponse* answer);
+VL_WS_Status VL_WS_removeAllItemsFromWishlist(VL_WS_Handle* handle, VL_WS_StandardResponse* answer);
+
+/*
+ * VL_WS_checkTitleInWishlist - whether title `titleID` is on the wishlist.
+ *
+ * A cache of user data that holds the title's flag answers at once (VL_WS_OK, no request).
+ * Otherwise the catalogue service's details of the title tell, and the answer is kept as the
+ * title's flag. The code counts.
+ */
+VL_WS_Status VL_WS_checkTitleInWishlist(VL_WS_Handle* handle, int titleID, bool* inWishlist);
+
+/*
+ * VL_WS_checkTitlesInWishlist - whether each of the `count` titles in `titleIDs` (both required)
+ * is on the wishlist, one flag per title in the given order, into a bool array record.
+ *
+ * The wishlist is read page by page (50 titles per page, titles of `titleType`) until every
+ * title was found or the last page was read. With a cache of user data the flags of all given
+ * titles are then kept. A page that fails ends the reading with its status and the flags found
+ * so far; a page that the store refuses (a non-zero code) ends it with VL_WS_OK and the flags
+ * found so far. Flags of an unfinished reading are not kept. The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_checkTitlesInWishlist(VL_WS_Handle* handle, int count, const int* titleIDs, int titleType,
+                                         VL_WS_BoolArray* flags);
+
+/* ---------------------------------------------------------------------------------------------
+ * Streaming
+ *
+ * Playing a purchased title or a bonus asset. These operations always go to the streaming
+ * service, whatever the handle's access type, and use no cache. Results, null arguments and
+ * failed calls are handled as by the account operations (see "Account operations in general").
+ * File profile, audio profile, stream status and bonus asset type are the store's numbers.
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_getStreamingAssetLocation - where pass `passID` streams from in `fileProfile`: the
+ * stream's URL, its DRM servers, a new stream instance (StreamID) with its heartbeat, and where
+ * playback resumes. VL_WS_loadLastStreamingAssetLocation answers the pass's last stream instance
+ * instead of a new one; VL_WS_getStreamingBonusAssetLocation the stream of a bonus asset. The
+ * code counts.
+ */
+VL_WS_Status VL_WS_getStreamingAssetLocation(VL_WS_Handle* handle, int passID, int fileProfile,
+                                             VL_WS_StreamingAssetLocationResponse* location);
+VL_WS_Status VL_WS_getStreamingBonusAssetLocation(VL_WS_Handle* handle, int bonusAssetID,
+                                                  VL_WS_StreamingAssetLocationResponse* location);
+VL_WS_Status VL_WS_loadLastStreamingAssetLocation(VL_WS_Handle* handle, int passID, int fileProfile,
+                                                  VL_WS_StreamingAssetLocationResponse* location);
+
+/*
+ * VL_WS_manageStreamingInstanceStatus - report that stream instance `streamID` (required) is in
+ * `status`, `stopTimeSeconds` into the title. The code counts.
+ */
+VL_WS_Status VL_WS_manageStreamingInstanceStatus(VL_WS_Handle* handle, const char* streamID, int status,
+                                                 int stopTimeSeconds, VL_WS_StandardResponse* answer);
+
+/*
+ * VL_WS_getTHXMediaDirector, VL_WS_getTHXMediaDirectorBonusAsset - THX media director settings
+ * of a pass in a file and audio profile, or of a bonus asset. The status is the SOAP call's: a
+ * title without settings is an answer with a non-zero code and status VL_WS_OK.
+ */
+VL_WS_Status VL_WS_getTHXMediaDirector(VL_WS_Handle* handle, int passID, int fileProfile, int audioProfile,
+                                       VL_WS_THXMediaDirectorResponse* settings);
+VL_WS_Status VL_WS_getTHXMediaDirectorBonusAsset(VL_WS_Handle* handle, int bonusAssetID, int fileProfile,
+                                                 int bonusAssetType, VL_WS_THXMediaDirectorResponse* settings);
+
+/*
+ * VL_WS_setAudioDefaultProperty, VL_WS_getAudioDefaultProperty - set or read the account's
+ * default audio profile. The status is the SOAP call's; the code of the setting stays in the
+ * record.
+ */
+VL_WS_Status VL_WS_setAudioDefaultProperty(VL_WS_Handle* handle, int audioProfile, VL_WS_StandardResponse* answer);
+VL_WS_Status VL_WS_getAudioDefaultProperty(VL_WS_Handle* handle, int* audioProfile);
+
+/* ---------------------------------------------------------------------------------------------
+ * Catalogue
+ *
+ * Every catalogue operation fills the record it is given (tagged even when the call fails, so
+ * always release it) and asks the store's catalogue service. Pages are given as a pair of ints,
+ * CurrentPageNumber then ItemsPerPage; purchase types (0 rent, 1 buy, 2 any) and title types
+ * (0 all, 1 television, 2 movies) are the store's numbers.
+ *
+ * A handle that caches catalogue answers (CACHE_METADATA) answers repeated requests with the
+ * same arguments from its cache, without a request; only successful answers are kept (response
+ * code 0, or a list that is not empty) and VL_WS_updateLocalCache drops them all when the store
+ * loaded a new catalogue. Operations marked "code folded" return VL_WS_E_UNEXPECTED for a
+ * non-zero ResponseCode of the store (the record still holds it); the others return VL_WS_OK and
+ * leave the code in the record for the caller.
+ *
+ * Besides the failures named, every operation returns VL_WS_E_INVALID_ARGUMENT for a null record
+ * or a handle without client state, and the status of a failed SOAP call (VL_WS_E_CONNECT,
+ * VL_WS_E_TLS, VL_WS_E_HTTP_STATUS(n), VL_WS_E_SOAP_FAULT(n), ...), after which the record holds
+ * nothing but its tags.
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_getNavigation - the store's genre tree as a flat list of genres (each with its parent's
+ * ID) into a genre array (release it). Cached (one tree per cache); a tree without genres is
+ * returned but never kept. The status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_getNavigation(VL_WS_Handle* handle, VL_WS_GenreArray* genres);
+
+/*
+ * VL_WS_getGenreLabel - the label and label message of a genre. Never cached; code folded.
+ */
+VL_WS_Status VL_WS_getGenreLabel(VL_WS_Handle* handle, int genreID, VL_WS_GenreLabelResponse* label);
+
+/*
+ * VL_WS_getTitles - one page of the titles of a genre (and of the genres below it). Cached by
+ * all four arguments; code folded.
+ */
+VL_WS_Status VL_WS_getTitles(VL_WS_Handle* handle, int genreID, int currentPageNumber, int itemsPerPage,
+                             int purchaseType, VL_WS_TitlesResponse* titles);
+
+/*
+ * VL_WS_getTitlesByGenreIDs - the same page of each of `count` genres, one VL_WS_TitlesResponse
+ * per page the store returned, in its order (read each page's ResponseCode). Never cached; the
+ * status is the SOAP call's. VL_WS_E_INVALID_ARGUMENT also for a count below 1 or a null
+ * `genreIDs`.
+ */
+VL_WS_Status VL_WS_getTitlesByGenreIDs(VL_WS_Handle* handle, int count, const int* genreIDs, int currentPageNumber,
+                                       int itemsPerPage, int purchaseType, VL_WS_TitlesResponseArray* pages);
+
+/*
+ * VL_WS_getTitleListing - the details of a title. Cached by the title ID; code folded. The
+ * answer also tells whether the title is in the account's wishlist: when the answer is kept,
+ * that is stored as the title's wishlist flag (with CACHE_USERDATA).
+ */
+VL_WS_Status VL_WS_getTitleListing(VL_WS_Handle* handle, int titleID, VL_WS_TitleListingResponse* details);
+
+/*
+ * VL_WS_getTvEpisodeListing - the details of one episode of a series. Cached by the episode ID;
+ * code folded; the series' wishlist flag is stored as with VL_WS_getTitleListing.
+ */
+VL_WS_Status VL_WS_getTvEpisodeListing(VL_WS_Handle* handle, int episodeID, VL_WS_TitleListingResponse* details);
+
+/*
+ * VL_WS_getTvEpisodeListByTitleID - the episodes (ID, name, number) of a series. Cached by the
+ * title ID; code folded.
+ */
+VL_WS_Status VL_WS_getTvEpisodeListByTitleID(VL_WS_Handle* handle, int titleID, VL_WS_TvEpisodeListResponse* episodes);
+
+/*
+ * VL_WS_getAllTvEpisodeListings - the details of every episode of a series, in the store's
+ * order (read each one's ResponseCode). Cached by the title ID when the list is not empty, with
+ * the wishlist flags of the listings; the status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_getAllTvEpisodeListings(VL_WS_Handle* handle, int titleID, VL_WS_TitleListingResponseArray* listings);
+
+/*
+ * VL_WS_translateTivoExternalID - the title of a TiVo external ID. Cached by the ID's text; the
+ * status is the SOAP call's. VL_WS_E_INVALID_ARGUMENT also for a null `tivoExternalID`.
+ */
+VL_WS_Status VL_WS_translateTivoExternalID(VL_WS_Handle* handle, const char* tivoExternalID,
+                                           VL_WS_TranslateTivoExternalIDResponse* translation);
+
+/*
+ * VL_WS_translateSkuID - the title of a SKU. Cached by the SKU ID; the status is the SOAP call's.
+ */
+VL_WS_Status VL_WS_translateSkuID(VL_WS_Handle* handle, int skuID, VL_WS_TranslateSkuIDResponse* translation);
+
+/*
+ * VL_WS_searchForTitle - one page of the titles whose name matches `query`;
+ * VL_WS_searchForTitleDetail also searches synopsis, actors and directors. Cached by all five
+ * arguments (the whole query, whatever its length); the status is the SOAP call's.
+ * VL_WS_E_INVALID_ARGUMENT also for a null or empty `query`.
+ */
+VL_WS_Status VL_WS_searchForTitle(VL_WS_Handle* handle, int currentPageNumber, int itemsPerPage, int purchaseType,
+                                  int titleType, const char* query, VL_WS_TitlesResponse* titles);
+VL_WS_Status VL_WS_searchForTitleDetail(VL_WS_Handle* handle, int currentPageNumber, int itemsPerPage,
+                                        int purchaseType, int titleType, const char* query,
+                                        VL_WS_TitlesResponse* titles);
+
+/*
+ * VL_WS_getRecommendedTitles - titles the store recommends with a title. Cached by the title ID;
+ * code folded.
+ */
+VL_WS_Status VL_WS_getRecommendedTitles(VL_WS_Handle* handle, int titleID, VL_WS_RecommendedTitlesResponse* titles);
+
 /* ---------------------------------------------------------------------------------------------
  * Cache
  * ------------------------------------------------------------------------------------------- */
@@ -126,6 +483,16 @@ VL_WS_Status VL_WS_getFileType(VL_WS_Handle* handle, VL_WS_FileType* fileType);
  * or a null `utcTime`.
  */
 VL_WS_Status VL_WS_getLastCacheLoadTimeUTC(VL_WS_Handle* handle, VL_WS_String* utcTime);
+
+/*
+ * VL_WS_shouldUpdateCache - ask the store whether a catalogue load time (a text as
+ * VL_WS_getLastCacheLoadTimeUTC gives it) is out of date. `update` is set to false first, then
+ * to true when the store says so. The handle's cache is not touched.
+ *
+ * Returns VL_WS_OK or the status of the SOAP call; VL_WS_E_INVALID_ARGUMENT for no client state,
+ * a null or empty `utcTime` or a null `update`.
+ */
+VL_WS_Status VL_WS_shouldUpdateCache(VL_WS_Handle* handle, const char* utcTime, bool* update);
 
 /*
  * VL_WS_updateLocalCache - refresh the kinds of cached data in `dataKinds` (bits of

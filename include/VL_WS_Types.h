@@ -9,9 +9,13 @@
 /* Status of every VL_WS_ operation: 0 success, negative failure (values in VL_WS_Records.h). */
 typedef int VL_WS_Status;
 
+/* The enumerations below have the fixed underlying type int: callers (the script layer among
+ * them) may hand over any int, and the operations say what they do with values outside the
+ * named ones. */
+
 /* Which store environment a handle talks to. 0 to 2 select a fixed one; VL_WS_ENV_DEFAULT (and
  * any larger value) asks the store's device-environment service at initialisation. */
-enum VL_WS_EnvNum {
+enum VL_WS_EnvNum : int {
   VL_WS_ENV_STGAPI = 0,
   VL_WS_ENV_STG = 1,
   VL_WS_ENV_PRODUCTION = 2,
@@ -23,10 +27,10 @@ enum VL_WS_EnvNum {
 typedef int VL_WS_EnvID;
 
 /* How the device gets its titles; decides which account service answers (download or stream). */
-enum VL_WS_AccessType { UNKNOWN = 0, DOWNLOAD = 1, STREAM = 2 };
+enum VL_WS_AccessType : int { UNKNOWN = 0, DOWNLOAD = 1, STREAM = 2 };
 
 /* Box-art image sizes; each value has a folder word and an image word in the image URL. */
-enum VL_WS_BoxArtSize {
+enum VL_WS_BoxArtSize : int {
   VL_WS_BOXART_95 = 0,
   VL_WS_BOXART_175 = 1,
   VL_WS_BOXART_65 = 2,
@@ -43,7 +47,7 @@ enum VL_WS_BoxArtSize {
 };
 
 /* Sort order of wishlist pages, passed to the store as its number (0 to 3; others become 0). */
-enum VL_WS_SortOrder {
+enum VL_WS_SortOrder : int {
   VL_WS_SORT_0 = 0,
   VL_WS_SORT_1 = 1,
   VL_WS_SORT_2 = 2,
@@ -53,7 +57,7 @@ enum VL_WS_SortOrder {
 /* Cache settings. */
 struct VL_WS_CacheParam {
   /* Which kinds of data are cached (bit set). */
-  enum CacheData {
+  enum CacheData : int {
     CACHE_NONE = 0,
     CACHE_METADATA = 1, /* catalogue answers */
     CACHE_BOXART = 2,   /* box-art images */
@@ -64,7 +68,7 @@ struct VL_WS_CacheParam {
 /* The caller's setup record for VL_WS_initialize. Strings are borrowed for the call only. */
 struct VL_WS_SetupParams {
   /* Catalogue of the handle. */
-  enum ContentType { GENERAL = 0, ADULT = 1 };
+  enum ContentType : int { GENERAL = 0, ADULT = 1 };
 
   const char* APIKey;              /* required: the application's key */
   const char* AuthToken;           /* optional: token from an earlier VL_WS_authorizeDevice */

@@ -19,7 +19,8 @@ namespace {
 // The image host of this program: VLWS_CONNECT_TO sends images.ostrel.example:80 here. The
 // library reads the variable once, at its first connection.
 VLTestServer& ImageHost() {
-  static VLTestServer s_Server;
+  // Never destroyed: at exit its thread would outlive OpenSSL's clean-up.
+  static VLTestServer& s_Server = *new VLTestServer();
   static const bool s_Mapped = [] {
     std::string map = std::string(VL_STORE_IMAGE_HOST) + ":80:127.0.0.1:" + std::to_string(s_Server.Port());
     return setenv("VLWS_CONNECT_TO", map.c_str(), 1) == 0;

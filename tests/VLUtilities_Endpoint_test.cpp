@@ -17,7 +17,8 @@ namespace {
 // The device-environment service of this program: VLWS_CONNECT_TO sends the production host's
 // port 443 here, and the test CA is trusted through SSL_CERT_FILE.
 VLTestServer& EnvironmentService() {
-  static VLTestServer s_Server(&VLTestPKI::Get().Trusted());
+  // Never destroyed: at exit its thread would outlive OpenSSL's clean-up.
+  static VLTestServer& s_Server = *new VLTestServer(&VLTestPKI::Get().Trusted());
   static const bool s_Mapped = [] {
     std::string map = std::string(VL_STORE_PRODUCTION_HOST) + ":443:127.0.0.1:" + std::to_string(s_Server.Port());
     return setenv("VLWS_CONNECT_TO", map.c_str(), 1) == 0;

@@ -20,35 +20,20 @@ namespace {
 
 const char kDevice[] = "00-11-22-33-44-55";
 
-class Client : public testing::Test {
+class Client : public VLSimClientTest {
  protected:
-  void SetUp() override {
-    m_Sim.ClearFaults();
-    m_Sim.ClearRequests();
-  }
   void TearDown() override {
-    VL_WS_release(&m_Handle);
-    m_Sim.ClearFaults();
+    VLSimClientTest::TearDown();
     m_Sim.Store().SetDeviceEnv(kDevice, 2);
     m_Sim.Store().SetAccessType(STREAM);
   }
 
-  void Fault(const std::string& spec) {
-    std::string error;
-    ASSERT_TRUE(m_Sim.AddFault(spec, &error)) << error;
-  }
   // Initialises m_Handle (released first).
   VL_WS_Status Init(const VL_WS_SetupParams& params) {
     VL_WS_release(&m_Handle);
     return VL_WS_initialize(&m_Handle, &params);
   }
   VL_WS_SetupParams2& Settings() { return m_Handle.client->m_Params; }
-  // The request log once it holds count requests: the simulator logs a request after its answer
-  // went out, and the client may be done with the answer before.
-  std::vector<VLSimRequest> Requests(size_t count) {
-    m_Sim.WaitForRequests(count, 5000);
-    return m_Sim.Requests();
-  }
   // The requests of the log (once it holds count) whose path starts with path.
   std::vector<VLSimRequest> RequestsTo(const std::string& path, size_t count) {
     std::vector<VLSimRequest> found;
@@ -65,9 +50,6 @@ class Client : public testing::Test {
     return params;
   }
   static bool IsEmpty(const VL_WS_Handle& handle) { return handle.tag == nullptr && handle.client == nullptr; }
-
-  VLSimServer& m_Sim = VLTestSimulator();
-  VL_WS_Handle m_Handle = {};
 };
 
 TEST_F(Client, FixedEnvironmentsTakeTheirEndpointWithoutAsking) {

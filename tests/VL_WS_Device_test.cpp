@@ -142,12 +142,11 @@ TEST(HttpURL, SplitsHostPortAndPath) {
 
 // ---- Operations against the simulator ----
 
-class Device : public VLSimTest {
+class Device : public VLSimClientTest {
  protected:
   void TearDown() override {
-    VL_WS_release(&m_Handle);
     m_Sim.Store().SetNow(time(nullptr));
-    VLSimTest::TearDown();
+    VLSimClientTest::TearDown();
   }
   void Init() {
     VL_WS_SetupParams params = VLTestSetupParams();
@@ -156,8 +155,6 @@ class Device : public VLSimTest {
     params.modelNumber = "BDP-1";
     ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
   }
-
-  VL_WS_Handle m_Handle = {};
 };
 
 // Times of the store's clock, as seconds since 1970 UTC.
@@ -174,8 +171,7 @@ TEST_F(Device, ServerTimeReadsTheStoresTwelveHourClock) {
     EXPECT_EQ(VL_WS_OK, VL_WS_getServerTime(&got));
     EXPECT_EQ(now, got);
   }
-  ASSERT_TRUE(m_Sim.WaitForRequests(4, 2000));
-  std::vector<VLSimRequest> requests = m_Sim.Requests();
+  std::vector<VLSimRequest> requests = Requests(4);
   ASSERT_EQ(4u, requests.size());
   EXPECT_EQ("store.ostrel.example", requests[0].host);
   EXPECT_EQ("/device/time/", requests[0].path);

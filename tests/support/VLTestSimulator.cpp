@@ -38,14 +38,22 @@ VL_WS_SetupParams VLTestSetupParams() {
   return params;
 }
 
-void VLSimTest::SetUp() {
+void VLSimClientTest::SetUp() {
   m_Sim.ClearFaults();
   m_Sim.ClearRequests();
 }
 
-void VLSimTest::TearDown() { m_Sim.ClearFaults(); }
+void VLSimClientTest::TearDown() {
+  VL_WS_release(&m_Handle);
+  m_Sim.ClearFaults();
+}
 
-void VLSimTest::Fault(const std::string& spec) {
+std::vector<VLSimRequest> VLSimClientTest::Requests(size_t count) {
+  m_Sim.WaitForRequests(count, 5000);
+  return m_Sim.Requests();
+}
+
+void VLSimClientTest::Fault(const std::string& spec) {
   std::string error;
   ASSERT_TRUE(m_Sim.AddFault(spec, &error)) << error;
 }

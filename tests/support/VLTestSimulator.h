@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-#include <string>
+#include <vector>
 
 #include "VLSimServer.h"
 #include "VL_WS.h"
@@ -21,16 +21,20 @@ VLSimServer& VLTestSimulator();
 // question to the store), no cache and no proxy. The strings are static.
 VL_WS_SetupParams VLTestSetupParams();
 
-// A test against the program's simulator: it starts without faults and with an empty request
-// log, and leaves no faults behind.
-class VLSimTest : public testing::Test {
+// A test on the program's simulator with one client handle: it starts without faults and with an
+// empty request log, and its handle is released at its end.
+class VLSimClientTest : public testing::Test {
  protected:
   void SetUp() override;
   void TearDown() override;
-  // Adds a fault in its written form (VLSimFaults.h); a fault that does not parse fails the test.
+
+  // The request log once it holds count requests (waiting up to 5 s): the simulator logs a
+  // request after its answer went out, and the client may be done with the answer before.
+  std::vector<VLSimRequest> Requests(size_t count);
   void Fault(const std::string& spec);
 
   VLSimServer& m_Sim = VLTestSimulator();
+  VL_WS_Handle m_Handle = {};
 };
 
 #endif  // VLTESTSIMULATOR_H
