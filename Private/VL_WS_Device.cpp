@@ -1,10 +1,11 @@
-// The device and network operations of the flat interface: the device's identifier, its local
-// address and User-Agent, and the store's clock.
+// The device and network operations of the flat interface: the bandwidth to the store, the
+// device's identifier, its local address and User-Agent, and the store's clock.
 #include <arpa/inet.h>
 #include <netdb.h>
 #include <netinet/in.h>
 #include <stdio.h>
 #include <string.h>
+#include <strings.h>
 #include <sys/socket.h>
 #include <time.h>
 
@@ -23,6 +24,39 @@ namespace {
 VLLogArea s_Log(VLWSAELOG_AREA_NAME);
 
 const char kTimePath[] = "/device/time/";
+
+// The bandwidth probe reads at most this many body bytes, in pieces of at most kProbePiece.
+const unsigned int kProbeBytes = 204800;
+const size_t kProbePiece = 2048;
+
+// The probe URL of the store's configuration: the value of its last item "BandwithCheckURL"
+// (the key in any letter case); url is left as it is when there is none. Returns the status of
+// VL_WS_getConfig.
+VL_WS_Status ConfiguredProbeURL(VL_WS_Handle* handle, VLString* url) {
+  VL_WS_ConfigResponse config;
+  VL_WS_Status status = VL_WS_getConfig(handle, &config);
+  for (int i = 0; status == VL_WS_OK && i < config.Count; ++i) {
+    if (strcasecmp(config.Items[i].Key, "BandwithCheckURL") == 0) *url = config.Items[i].Value;
+  }
+  VL_WS_release(&config);
+  return status;
+}
+
+// Lets a context's connections go directly to their hosts for the lifetime of the object: the
+// proxy host is cleared and restored at the end.
+class DirectConnections {
+ public:
+  explicit DirectConnections(soap* context) : m_Context(context), m_ProxyHost(context->proxy_host) {
+    context->proxy_host = 0;
+  }
+  ~DirectConnections() { m_Context->proxy_host = m_ProxyHost; }
+  DirectConnections(const DirectConnections&) = delete;
+  DirectConnections& operator=(const DirectConnections&) = delete;
+
+ private:
+  soap* m_Context;
+  const char* m_ProxyHost;
+};
 
 // The store's clock as the time service writes it: "month/day/year hour:minute:second AM|PM"
 // in UTC, the hour on the 12-hour clock. False when fewer than the seven fields are there or a
@@ -72,6 +106,50 @@ VLString ResolverAddress() {
 }
 
 }  // namespace
+
+extern "C" VL_WS_Status VL_WS_checkBandwidth(VL_WS_Handle* handle, unsigned int* bitsPerSecond) {
+  if (bitsPerSecond == 0) return VL_WS_E_INVALID_ARGUMENT;
+  *bitsPerSecond = 0;
+  VL_WS_Client* client = VLClientOf(handle);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  VLString& probeURL = client->m_Params.BandwithCheckURL;
+  if (probeURL.empty()) {
+    VL_WS_Status status = ConfiguredProbeURL(handle, &probeURL);
+    if (status != VL_WS_OK) return status;
+    if (probeURL.empty()) return VL_WS_E_BANDWIDTH_NO_URL;
+  }
+  VLHttpURL url;
+  if (!VLHttpGet::SplitURL(probeURL.c_str(), &url)) return VL_WS_E_BANDWIDTH_BAD_URL;
+
+  DirectConnections direct(&client->m_RealTimeBrowse);
+  VLHttpGet get(&client->m_RealTimeBrowse);
+  VLString request = "GET /" + url.path + " HTTP/1.1\r\nHost: " + url.authority + "\r\nUser-Agent: DUDUVud\r\n\r\n";
+  switch (get.Run(probeURL.c_str(), url.host.c_str(), url.port, request)) {
+    case VLHttpGet::HTTP_OK:
+      break;
+    case VLHttpGet::HTTP_CONNECT_FAILED:
+      return VL_WS_E_CONNECT;
+    case VLHttpGet::HTTP_NOT_FOUND:
+      return VL_WS_E_HTTP_NOT_FOUND;
+    default:
+      return VL_WS_E_NETWORK;
+  }
+  // Only the body after the header is timed; the bytes that came with the header count as if
+  // they had been.
+  unsigned int length = get.ContentLength() < kProbeBytes ? static_cast<unsigned int>(get.ContentLength()) : kProbeBytes;
+  unsigned int start = VLUtilities::MillisecondTime();
+  size_t remaining = length > get.BodyReceived() ? length - get.BodyReceived() : 0;
+  char piece[kProbePiece];
+  while (remaining > 0) {
+    size_t received = get.Receive(piece, remaining < sizeof piece ? remaining : sizeof piece);
+    if (received == 0) return VL_WS_E_NETWORK;
+    remaining -= received;
+  }
+  unsigned int elapsed = VLUtilities::MillisecondTime() - start;
+  get.Close();
+  *bitsPerSecond = length * 8000u / (elapsed == 0 ? 1 : elapsed);
+  return VL_WS_OK;
+}
 
 extern "C" VL_WS_Status VL_WS_getDestinationUniqueID(VL_WS_String* id) {
   if (id == 0) return VL_WS_E_INVALID_ARGUMENT;

@@ -582,6 +582,28 @@ VL_WS_Status VL_WS_release(void* record);
  * ------------------------------------------------------------------------------------------- */
 
 /*
+ * VL_WS_checkBandwidth - measure the download bandwidth from the store, in bits per second.
+ *
+ * The probe URL is the handle's BandwithCheckURL; the first check fills it from the store's
+ * configuration (VL_WS_getConfig: the last item "BandwithCheckURL", the key in any letter case).
+ * The probe, "http://host[:port]/path" or "https://...", is fetched directly, never through
+ * the handle's proxy; at most 204800 bytes of its body are read, and the time is taken from the
+ * end of the answer's header. The result is the bytes read times 8000 divided by the
+ * milliseconds taken (at least 1).
+ *
+ * `bitsPerSecond` is 0 unless the call succeeds. Returns VL_WS_OK, or:
+ *   VL_WS_E_INVALID_ARGUMENT   null `bitsPerSecond`, no client state
+ *   (status of VL_WS_getConfig) the configuration could not be read
+ *   VL_WS_E_BANDWIDTH_NO_URL   the configuration names no probe URL
+ *   VL_WS_E_BANDWIDTH_BAD_URL  the probe URL has no "//", no host, no path or a bad port
+ *   VL_WS_E_CONNECT            the probe's host could not be connected to
+ *   VL_WS_E_HTTP_NOT_FOUND     the probe's host answered "404 Not Found"
+ *   VL_WS_E_NETWORK            sending failed, nothing was received, the answer is not "200 OK"
+ *                              with a Content-Length above 0, or the body ended early
+ */
+VL_WS_Status VL_WS_checkBandwidth(VL_WS_Handle* handle, unsigned int* bitsPerSecond);
+
+/*
  * VL_WS_getDestinationUniqueID - the device's identifier into a string record (release it):
  * the hardware address of its first network interface with one, as "XX-XX-XX-XX-XX-XX"
  * (upper-case hexadecimal); on a device without one a random identifier of the same form,

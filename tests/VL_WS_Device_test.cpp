@@ -1,6 +1,7 @@
 // The device and network operations against real sockets: the hand-built HTTP exchange
-// (VLHttpGet) against canned answers of a loopback server, and the operations against the store
-// simulator: the server time, the local address, the User-Agent and the device identifier.
+// (VLHttpGet) and the bandwidth probe against canned answers of a loopback server, and the
+// operations against the store simulator: the bandwidth probe of the store's configuration, the
+// server time, the local address, the User-Agent and the device identifier.
 #include <gtest/gtest.h>
 #include <sys/socket.h>
 #include <time.h>
@@ -156,6 +157,158 @@ class Device : public VLSimClientTest {
     ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
   }
 };
+
+// ---- Bandwidth ----
+
+// The probe URL of the simulator's configuration.
+const char kStoreProbe[] = "http://images.ostrel.example/speedtest/probe.bin";
+
+class Bandwidth : public Device {
+ protected:
+  // The tests may change the probe items of the store's configuration.
+  void TearDown() override {
+    m_Sim.Store().SetConfigItem("BANDWITHCHECKURL", "");
+    m_Sim.Store().SetConfigItem("BandwithCheckURL", kStoreProbe);
+    Device::TearDown();
+  }
+  // Checks with the probe URL set on the handle, so the configuration is not asked.
+  VL_WS_Status Check(const std::string& url, unsigned int* bits) {
+    m_Handle.client->m_Params.BandwithCheckURL = url.c_str();
+    *bits = 12345;
+    return VL_WS_checkBandwidth(&m_Handle, bits);
+  }
+  // A probe URL on the canned server.
+  std::string Canned(const std::string& reply) {
+    m_Probe.SetReply(reply);
+    return "http://127.0.0.1:" + std::to_string(m_Probe.Port()) + "/speed/probe.bin";
+  }
+  static std::string Answer(size_t contentLength, size_t bodyBytes) {
+    return "HTTP/1.1 200 OK\r\nContent-Length: " + std::to_string(contentLength) + "\r\n\r\n" +
+           std::string(bodyBytes, 'p');
+  }
+
+  VLTestServer m_Probe;
+};
+
+TEST_F(Bandwidth, AnAnnouncedMegabyteIsMeasuredOverItsFirst204800Bytes) {
+  Init();
+  unsigned int bits = 0;
+  // The server sends no more than 204800 bytes: a probe that waited for more would fail.
+  ASSERT_EQ(VL_WS_OK, Check(Canned(Answer(1000000, 204800)), &bits));
+  EXPECT_GT(bits, 0u);
+  EXPECT_LE(bits, 204800u * 8000u);
+  ASSERT_EQ(1u, m_Probe.Requests().size());
+  std::string request = m_Probe.Requests()[0];
+  EXPECT_EQ(0u, request.find("GET /speed/probe.bin HTTP/1.1\r\n"));
+  EXPECT_EQ("127.0.0.1:" + std::to_string(m_Probe.Port()), VLTestServer::Header(request, "Host"));
+  EXPECT_EQ("DUDUVud", VLTestServer::Header(request, "User-Agent"));
+
+  EXPECT_EQ(VL_WS_E_NETWORK, Check(Canned(Answer(1000000, 204799)), &bits));
+  EXPECT_EQ(0u, bits);
+}
+
+TEST_F(Bandwidth, ABodyThatCameWithTheHeaderCountsAsTimedInAtLeastOneMillisecond) {
+  Init();
+  unsigned int bits = 0;
+  ASSERT_EQ(VL_WS_OK, Check(Canned(Answer(100, 100)), &bits));
+  EXPECT_LE(bits, 800000u);  // 100 bytes in 1 millisecond at most
+  EXPECT_GE(bits, 8000u);
+}
+
+TEST_F(Bandwidth, FailuresOfTheProbe) {
+  Init();
+  struct {
+    std::string reply;
+    VL_WS_Status status;
+  } cases[] = {
+      {"HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n", VL_WS_E_HTTP_NOT_FOUND},
+      {"HTTP/1.1 503 Service Unavailable\r\nContent-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\n\r\nxyz", VL_WS_E_NETWORK},
+      {"", VL_WS_E_NETWORK},
+  };
+  unsigned int bits = 0;
+  for (const auto& c : cases) {
+    EXPECT_EQ(c.status, Check(Canned(c.reply), &bits)) << c.reply;
+    EXPECT_EQ(0u, bits);
+  }
+  EXPECT_EQ(VL_WS_E_CONNECT, Check("http://127.0.0.1:" + std::to_string(ClosedPort()) + "/probe", &bits));
+  for (const char* url : {"http://images.ostrel.example", "http://images.ostrel.example/", "images.ostrel.example/p",
+                          "http:///probe", "http://images.ostrel.example:http/probe"}) {
+    EXPECT_EQ(VL_WS_E_BANDWIDTH_BAD_URL, Check(url, &bits)) << url;
+    EXPECT_EQ(0u, bits);
+  }
+  VL_WS_Handle none = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_checkBandwidth(&none, &bits));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_checkBandwidth(&m_Handle, nullptr));
+}
+
+TEST_F(Bandwidth, TheProbeBypassesTheHandlesProxyAndRestoresIt) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.ProxyHost = "127.0.0.1";
+  params.ProxyPort = ClosedPort();
+  ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
+  const char* proxy = m_Handle.client->m_RealTimeBrowse.proxy_host;
+  ASSERT_NE(nullptr, proxy);
+  unsigned int bits = 0;
+  EXPECT_EQ(VL_WS_OK, Check(Canned(Answer(5000, 5000)), &bits));
+  EXPECT_EQ(proxy, m_Handle.client->m_RealTimeBrowse.proxy_host);
+  EXPECT_EQ(VL_WS_E_NETWORK, Check(Canned(""), &bits));
+  EXPECT_EQ(proxy, m_Handle.client->m_RealTimeBrowse.proxy_host);
+}
+
+TEST_F(Bandwidth, TheProbeURLComesFromTheStoresConfigurationOnce) {
+  Init();
+  unsigned int bits = 0;
+  ASSERT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
+  EXPECT_GT(bits, 0u);
+  EXPECT_STREQ(kStoreProbe, m_Handle.client->m_Params.BandwithCheckURL.c_str());
+  std::vector<VLSimRequest> requests = Requests(2);
+  ASSERT_EQ(2u, requests.size());
+  EXPECT_EQ("getConfig", requests[0].operation);
+  EXPECT_EQ("bandwidth probe", requests[1].note);
+
+  m_Sim.ClearRequests();
+  ASSERT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
+  requests = Requests(1);
+  ASSERT_EQ(1u, requests.size());
+  EXPECT_EQ("bandwidth probe", requests[0].note);
+}
+
+TEST_F(Bandwidth, TheLastProbeKeyInAnyLetterCaseWins) {
+  std::string canned = Canned(Answer(5000, 5000));
+  m_Sim.Store().SetConfigItem("BANDWITHCHECKURL", canned);
+  Init();
+  unsigned int bits = 0;
+  EXPECT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
+  EXPECT_EQ(canned, m_Handle.client->m_Params.BandwithCheckURL.c_str());
+  EXPECT_EQ(1u, m_Probe.Requests().size());
+}
+
+TEST_F(Bandwidth, AConfigurationWithoutProbeOrNoConfigurationAtAll) {
+  Init();
+  unsigned int bits = 12345;
+  Fault("getConfig=status:503,times=1");
+  EXPECT_EQ(VL_WS_E_HTTP_STATUS(503), VL_WS_checkBandwidth(&m_Handle, &bits));
+  EXPECT_EQ(0u, bits);
+  m_Sim.Store().SetConfigItem("BandwithCheckURL", "");
+  EXPECT_EQ(VL_WS_E_BANDWIDTH_NO_URL, VL_WS_checkBandwidth(&m_Handle, &bits));
+  EXPECT_STREQ("", m_Handle.client->m_Params.BandwithCheckURL.c_str());
+}
+
+TEST_F(Bandwidth, TheStoresProbeOnTheImageHost) {
+  Init();
+  unsigned int bits = 0;
+  ASSERT_EQ(VL_WS_OK, Check(kStoreProbe, &bits));
+  EXPECT_GT(bits, 0u);
+  VLSimRequest probe = Requests(1).back();
+  EXPECT_EQ("images.ostrel.example", probe.host);
+  EXPECT_EQ("/speedtest/probe.bin", probe.path);
+  EXPECT_EQ("DUDUVud", probe.userAgent);
+  EXPECT_EQ("bandwidth probe", probe.note);
+  Fault("/speedtest/=status:404,times=1");
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Check(kStoreProbe, &bits));
+}
 
 // Times of the store's clock, as seconds since 1970 UTC.
 const time_t k20101231_235959 = 1293839999;
