@@ -11,6 +11,8 @@
 #include "VL_WS_Types.h"
 #include "VL_WS_Records.h"
 
+#include <time.h> /* time_t */
+
 extern "C" {
 
 /* ---------------------------------------------------------------------------------------------
@@ -622,6 +624,202 @@ VL_WS_Status VL_WS_getBoxArtImageData(VL_WS_Handle* handle, VL_WS_BoxArtSize siz
  * (above VL_WS_TAG_LAST, negative, or one of the reserved tags 45 to 48); nothing is freed then.
  */
 VL_WS_Status VL_WS_release(void* record);
+
+/* ---------------------------------------------------------------------------------------------
+ * Device and network
+ *
+ * The network operations send one plain HTTP/1.1 request each, over the same connection
+ * machinery as the SOAP calls (VLWS_CONNECT_TO and TLS apply).
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_checkBandwidth - measure the download bandwidth from the store, in bits per second.
+ *
+ * The probe URL is the handle's BandwithCheckURL; the first check fills it from the store's
+ * configuration (VL_WS_getConfig: the last item "BandwithCheckURL", the key in any letter case).
+ * The probe, "http://host[:port]/path" or "https://...", is fetched directly, never through
+ * the handle's proxy; at most 204800 bytes of its body are read, and the time is taken from the
+ * end of the answer's header. The result is the bytes read times 8000 divided by the
+ * milliseconds taken (at least 1).
+ *
+ * `bitsPerSecond` is 0 unless the call succeeds. Returns VL_WS_OK, or:
+ *   VL_WS_E_INVALID_ARGUMENT   null `bitsPerSecond`, no client state
+ *   (status of VL_WS_getConfig) the configuration could not be read
+ *   VL_WS_E_BANDWIDTH_NO_URL   the configuration names no probe URL
+ *   VL_WS_E_BANDWIDTH_BAD_URL  the probe URL has no "//", no host, no path or a bad port
+ *   VL_WS_E_CONNECT            the probe's host could not be connected to
+ *   VL_WS_E_HTTP_NOT_FOUND     the probe's host answered "404 Not Found"
+ *   VL_WS_E_NETWORK            sending failed, nothing was received, the answer is not "200 OK"
+ *                              with a Content-Length above 0, or the body ended early
+ */
+VL_WS_Status VL_WS_checkBandwidth(VL_WS_Handle* handle, unsigned int* bitsPerSecond);
+
+/*
+ * VL_WS_getDestinationUniqueID - the device's identifier into a string record (release it):
+ * the hardware address of its first network interface with one, as "XX-XX-XX-XX-XX-XX"
+ * (upper-case hexadecimal); on a device without one a random identifier of the same form,
+ * new at every call.
+ *
+ * Returns VL_WS_OK, or VL_WS_E_INVALID_ARGUMENT for a null `id`.
+ */
+VL_WS_Status VL_WS_getDestinationUniqueID(VL_WS_String* id);
+
+/*
+ * VL_WS_getUserAgent - the User-Agent text of the handle's SOAP requests into a string record
+ * (release it); empty when the handle sends the default.
+ *
+ * Returns VL_WS_OK, or VL_WS_E_INVALID_ARGUMENT (no client state, null `userAgent`); the record
+ * is then left untouched.
+ */
+VL_WS_Status VL_WS_getUserAgent(VL_WS_Handle* handle, VL_WS_String* userAgent);
+
+/*
+ * VL_WS_getLocalIPAddr - the device's IPv4 address in dotted form into a string record (release
+ * it): the one non-loopback address the system resolver gives for the device, else the local
+ * address of a connection to the handle's catalogue service (through its proxy, if any).
+ *
+ * Returns VL_WS_OK, or:
+ *   VL_WS_E_INVALID_ARGUMENT  null `address`, no client state
+ *   VL_WS_E_UNEXPECTED        the handle's service URL names no host
+ *   VL_WS_E_CONNECT           the catalogue service could not be connected to
+ *   VL_WS_E_NETWORK           the connection's local address could not be read
+ */
+VL_WS_Status VL_WS_getLocalIPAddr(VL_WS_Handle* handle, VL_WS_String* address);
+
+/*
+ * VL_WS_getServerTime - the store's clock, in seconds since 1970 UTC, from its time service
+ * "http://store.ostrel.example/device/time/". It needs no handle.
+ *
+ * `serverTime` is -1 unless the call succeeds. Returns VL_WS_OK, or:
+ *   VL_WS_E_INVALID_ARGUMENT  null `serverTime`
+ *   VL_WS_E_CONNECT           the service could not be connected to
+ *   VL_WS_E_NETWORK           sending failed, nothing was received, or the answer is not
+ *                             "200 OK" with a Content-Length above 0
+ *   VL_WS_E_UNEXPECTED        the body is shorter than announced or is not a time
+ *                             "month/day/year hour:minute:second AM|PM"
+ */
+VL_WS_Status VL_WS_getServerTime(time_t* serverTime);
+
+/* ---------------------------------------------------------------------------------------------
+ * Settings files
+ *
+ * A settings file is a small XML file of key/value pairs (the configuration and settings files
+ * of the configuration extension). Keys compare byte for byte. An encrypted value is stored with
+ * its own random password and a check, so two writes of the same value store different texts.
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_readSetting - the value of `key` in the settings file `filename`, decrypted when
+ * `encrypted` is true, into a string record (release it).
+ *
+ * Only the first setting with the key counts. An encrypted read of a value stored plain, or of
+ * a value that was changed by hand, is VL_WS_E_SETTING_DAMAGED.
+ *
+ * Returns VL_WS_OK, or:
+ *   VL_WS_E_INVALID_ARGUMENT  null `value`; null or empty `filename` or `key`
+ *   VL_WS_E_FILE              the file cannot be opened or read
+ *   VL_WS_E_SETTING_MISSING   the file is empty, holds no settings, or none with the key
+ *   VL_WS_E_SETTING_DAMAGED   the encrypted value is damaged (also: an encrypted empty value)
+ * On failure the record is tagged and holds no text.
+ */
+VL_WS_Status VL_WS_readSetting(const char* filename, const char* key, VL_WS_String* value,
+                               bool encrypted);
+
+/*
+ * VL_WS_writeSetting - set `key` to `value` in the settings file `filename`, encrypted when
+ * `encrypted` is true.
+ *
+ * The first setting with the key is replaced in place, or a new one is appended; every other
+ * setting keeps its place and text. A missing file, and the folder of `filename` when it is
+ * missing, are created. The file is replaced whole, so a crash leaves the old or the new file.
+ * An empty value written encrypted reads back as VL_WS_E_SETTING_DAMAGED.
+ *
+ * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (null or empty `filename` or `key`, null `value`)
+ * or VL_WS_E_FILE (the folder or the file cannot be created or written).
+ */
+VL_WS_Status VL_WS_writeSetting(const char* filename, const char* key, const char* value,
+                                bool encrypted);
+
+/*
+ * VL_WS_createEnvXML - copy the file `source` to `destination` unless `destination` exists.
+ *
+ * An existing destination is left untouched. A copy that fails leaves no destination behind.
+ * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (a null argument) or VL_WS_E_FILE.
+ */
+VL_WS_Status VL_WS_createEnvXML(const char* source, const char* destination);
+
+/*
+ * VL_WS_deleteEnvXML - remove the file `filename` if it exists.
+ *
+ * Returns VL_WS_OK (also when there is no such file or it cannot be removed), or
+ * VL_WS_E_INVALID_ARGUMENT for a null `filename`.
+ */
+VL_WS_Status VL_WS_deleteEnvXML(const char* filename);
+
+/* ---------------------------------------------------------------------------------------------
+ * Files and folders
+ * ------------------------------------------------------------------------------------------- */
+
+/*
+ * VL_WS_checkVLSWFmd5sum - the output of the system's md5sum command for the file `filename`
+ * into a string record (release it): normally 32 hexadecimal digits, two blanks, the file name
+ * and a line end; empty when md5sum found no such file.
+ *
+ * The name reaches the command as one quoted word: no character of it is interpreted by the
+ * shell. Returns VL_WS_OK, or:
+ *   VL_WS_E_INVALID_ARGUMENT  null `md5sum` or `filename`; a name so long that the command
+ *                             would exceed 1023 bytes
+ *   VL_WS_E_UNEXPECTED        the command could not be started
+ */
+VL_WS_Status VL_WS_checkVLSWFmd5sum(const char* filename, VL_WS_String* md5sum);
+
+/*
+ * VL_WS_removeFile - remove the file `filename`.
+ *
+ * Returns VL_WS_OK (also when there is no such file), VL_WS_E_INVALID_ARGUMENT (null
+ * `filename`) or VL_WS_E_FILE (the file exists and cannot be removed).
+ */
+VL_WS_Status VL_WS_removeFile(const char* filename);
+
+/*
+ * VL_WS_copyFile - copy the file `source` to `destination`, which is created or overwritten.
+ *
+ * A copy that fails leaves no destination behind unless one existed before. Copying a file
+ * onto itself fails. Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (a null argument) or
+ * VL_WS_E_FILE.
+ */
+VL_WS_Status VL_WS_copyFile(const char* source, const char* destination);
+
+/*
+ * VL_WS_getFolderName - the folder part of `path`, up to and including its last "/", into a
+ * string record (release it). A path without "/" gives the path followed by "/", the empty
+ * path "./".
+ *
+ * Returns VL_WS_OK, or VL_WS_E_INVALID_ARGUMENT for a null argument.
+ */
+VL_WS_Status VL_WS_getFolderName(const char* path, VL_WS_String* folder);
+
+/*
+ * VL_WS_folderExist - whether `path` names an existing folder.
+ *
+ * Returns VL_WS_OK, or VL_WS_E_INVALID_ARGUMENT for a null argument.
+ */
+VL_WS_Status VL_WS_folderExist(const char* path, bool* exist);
+
+/*
+ * VL_WS_createFolder - create the folder `path` with every missing parent.
+ *
+ * Returns VL_WS_OK (also when it exists), VL_WS_E_INVALID_ARGUMENT (null `path`) or
+ * VL_WS_E_FILE (a part of the path is not a folder, or a folder cannot be made).
+ */
+VL_WS_Status VL_WS_createFolder(const char* path);
+
+/*
+ * VL_WS_fileExist - whether the file `path` exists and can be read.
+ *
+ * Returns VL_WS_OK, or VL_WS_E_INVALID_ARGUMENT for a null argument.
+ */
+VL_WS_Status VL_WS_fileExist(const char* path, bool* exist);
 
 }  /* extern "C" */
 

@@ -1,14 +1,12 @@
-// The demo's store session: the movie constructs the three extension classes by their class
-// ids and drives the player through its methods.
+// The demo's store session: the movie constructs the store and player extension classes by
+// their class ids and drives the player through its methods.
 
 print('demo: constructing the extension classes');
 var store = newExtension('com.ostrel.DUDUVud');
-var config = newExtension('com.ostrel.VLCfgLib');
 var player = newExtension('com.ostrel.VLPlayerLibAE');
 
-// The store and configuration classes answer with their initial results until they are built.
+// The store class answers with its initial results until it is built.
 show('store.init', store.init([{ onComplete: function () {} }, {}]));
-show('config.read', config.read('AuthToken', true));
 
 print('demo: driving the player');
 callEach('player', player, [

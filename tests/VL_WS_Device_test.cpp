@@ -1,0 +1,403 @@
+// The device and network operations against real sockets: the hand-built HTTP exchange
+// (VLHttpGet) and the bandwidth probe against canned answers of a loopback server, and the
+// operations against the store simulator: the bandwidth probe of the store's configuration, the
+// server time, the local address, the User-Agent and the device identifier.
+#include <gtest/gtest.h>
+#include <sys/socket.h>
+#include <time.h>
+
+#include <regex>
+#include <string>
+
+#include "VLHttpGet.h"
+#include "VLSoapTransport.h"
+#include "VLTestServer.h"
+#include "VLTestSimulator.h"
+#include "VL_WS.h"
+#include "VL_WS_Client.h"
+
+namespace {
+
+// The library reads VLWS_CONNECT_TO at its first connection: the simulator starts before any
+// test connects.
+class SimulatorFirst : public testing::Environment {
+ public:
+  void SetUp() override { VLTestSimulator(); }
+};
+testing::Environment* const s_Simulator = testing::AddGlobalTestEnvironment(new SimulatorFirst);
+
+// A port on which nothing listens.
+int ClosedPort() {
+  VLTestServer gone;
+  return gone.Port();
+}
+
+// ---- VLHttpGet ----
+
+// A context as the library's plain requests use it, with short time-outs.
+class HttpContext : public soap {
+ public:
+  HttpContext() : soap(SOAP_C_UTFSTRING) {
+    send_timeout = connect_timeout = recv_timeout = 5;
+    socket_flags = MSG_NOSIGNAL;
+    VLSoapTransport::Install(this);
+  }
+};
+
+class HttpGet : public testing::Test {
+ protected:
+  VLHttpGet::Result Get(const std::string& reply) {
+    m_Server.SetReply(reply);
+    return Run(m_Server.Port());
+  }
+  VLHttpGet::Result Run(int port) {
+    std::string url = "http://127.0.0.1:" + std::to_string(port) + "/probe";
+    return m_Get.Run(url.c_str(), "127.0.0.1", port, "GET /probe HTTP/1.1\r\nHost: probe\r\n\r\n");
+  }
+
+  VLTestServer m_Server;
+  HttpContext m_Context;
+  VLHttpGet m_Get{&m_Context};
+};
+
+TEST_F(HttpGet, FindsTheBodyAndTheHeaderFields) {
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\ncontent-length:  5 \r\nLast-Modified: Mon, 03 Jan 2011 "
+                                    "10:00:00 GMT\r\nX-Empty:\r\n\r\nhello"));
+  EXPECT_EQ(5u, m_Get.ContentLength());
+  ASSERT_EQ(5u, m_Get.BodyReceived());
+  EXPECT_STREQ("hello", m_Get.Body());
+  VLString value;
+  EXPECT_TRUE(m_Get.Field("Last-Modified", &value));
+  EXPECT_STREQ("Mon, 03 Jan 2011 10:00:00 GMT", value.c_str());
+  EXPECT_TRUE(m_Get.Field("x-empty", &value));
+  EXPECT_STREQ("", value.c_str());
+  EXPECT_FALSE(m_Get.Field("Content", &value));
+  EXPECT_FALSE(m_Get.Field("ETag", &value));
+  ASSERT_EQ(1u, m_Server.Requests().size());
+  EXPECT_EQ("GET /probe HTTP/1.1\r\nHost: probe\r\n\r\n", m_Server.Requests()[0]);
+}
+
+TEST_F(HttpGet, ABodyBeyondItsLengthIsCutAndALongerOneIsReadOn) {
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 3\r\n\r\nabcdef"));
+  EXPECT_EQ(3u, m_Get.BodyReceived());
+  EXPECT_STREQ("abc", m_Get.Body());
+
+  std::string body(10000, 'x');
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 10000\r\n\r\n" + body));
+  size_t total = m_Get.BodyReceived();
+  EXPECT_LT(total, 2048u);
+  char piece[4096];
+  while (size_t n = m_Get.Receive(piece, sizeof piece)) total += n;
+  EXPECT_EQ(10000u, total);
+}
+
+TEST_F(HttpGet, OtherAnswersAreNamed) {
+  static const char kNulInHeader[] = "HTTP/1.1 200 OK\r\nX-Nul: a\0b\r\nContent-Length: 1\r\n\r\nx";
+  struct {
+    std::string reply;
+    VLHttpGet::Result result;
+  } cases[] = {
+      {"HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n", VLHttpGet::HTTP_NOT_FOUND},
+      {"HTTP/1.1 304 Not Modified\r\n\r\n", VLHttpGet::HTTP_NOT_MODIFIED},
+      {"HTTP/1.1 500 Internal Server Error\r\nContent-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.0 200 OK\r\nContent-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 12x\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: -1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 99999999999999999999\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nX-Body: Content-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 1\r\n", VLHttpGet::HTTP_BAD_ANSWER},
+      // The whole header must come in the first piece.
+      {"HTTP/1.1 200 OK\r\nX-Long: " + std::string(3000, 'a') + "\r\nContent-Length: 1\r\n\r\nx",
+       VLHttpGet::HTTP_BAD_ANSWER},
+      {std::string(kNulInHeader, sizeof kNulInHeader - 1), VLHttpGet::HTTP_OK},
+      {"", VLHttpGet::HTTP_NOTHING_RECEIVED},
+  };
+  for (const auto& c : cases) EXPECT_EQ(c.result, Get(c.reply)) << c.reply;
+}
+
+TEST_F(HttpGet, ConnectionFailures) {
+  EXPECT_EQ(VLHttpGet::HTTP_CONNECT_FAILED, Run(ClosedPort()));
+  m_Server.SetBehaviour(VLTestServer::kCloseAtOnce);
+  EXPECT_NE(VLHttpGet::HTTP_OK, Run(m_Server.Port()));
+}
+
+TEST(HttpURL, SplitsHostPortAndPath) {
+  VLHttpURL parts;
+  ASSERT_TRUE(VLHttpGet::SplitURL("http://images.ostrel.example/probe/file.bin", &parts));
+  EXPECT_STREQ("images.ostrel.example", parts.host.c_str());
+  EXPECT_EQ(80, parts.port);
+  EXPECT_STREQ("probe/file.bin", parts.path.c_str());
+  ASSERT_TRUE(VLHttpGet::SplitURL("HTTPS://store.ostrel.example/api/RealTimeBrowse.asmx", &parts));
+  EXPECT_EQ(443, parts.port);
+  ASSERT_TRUE(VLHttpGet::SplitURL("http://127.0.0.1:8080/p", &parts));
+  EXPECT_STREQ("127.0.0.1:8080", parts.authority.c_str());
+  EXPECT_STREQ("127.0.0.1", parts.host.c_str());
+  EXPECT_EQ(8080, parts.port);
+  for (const char* bad : {"http://host", "http://host/", "images.ostrel.example/probe", "http:///probe",
+                          "http://:80/probe", "http://host:/p", "http://host:0/p", "http://host:65536/p",
+                          "http://host:8o/p"})
+    EXPECT_FALSE(VLHttpGet::SplitURL(bad, &parts)) << bad;
+}
+
+// ---- Operations against the simulator ----
+
+class Device : public VLSimClientTest {
+ protected:
+  void TearDown() override {
+    m_Sim.Store().SetNow(time(nullptr));
+    VLSimClientTest::TearDown();
+  }
+  void Init() {
+    VL_WS_SetupParams params = VLTestSetupParams();
+    params.firmwareVersion = "fw-2.1";
+    params.ApplicationRevision = "rev-7";
+    params.modelNumber = "BDP-1";
+    ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
+  }
+};
+
+// ---- Bandwidth ----
+
+// The probe URL of the simulator's configuration.
+const char kStoreProbe[] = "http://images.ostrel.example/speedtest/probe.bin";
+
+class Bandwidth : public Device {
+ protected:
+  // The tests may change the probe items of the store's configuration.
+  void TearDown() override {
+    m_Sim.Store().SetConfigItem("BANDWITHCHECKURL", "");
+    m_Sim.Store().SetConfigItem("BandwithCheckURL", kStoreProbe);
+    Device::TearDown();
+  }
+  // Checks with the probe URL set on the handle, so the configuration is not asked.
+  VL_WS_Status Check(const std::string& url, unsigned int* bits) {
+    m_Handle.client->m_Params.BandwithCheckURL = url.c_str();
+    *bits = 12345;
+    return VL_WS_checkBandwidth(&m_Handle, bits);
+  }
+  // A probe URL on the canned server.
+  std::string Canned(const std::string& reply) {
+    m_Probe.SetReply(reply);
+    return "http://127.0.0.1:" + std::to_string(m_Probe.Port()) + "/speed/probe.bin";
+  }
+  static std::string Answer(size_t contentLength, size_t bodyBytes) {
+    return "HTTP/1.1 200 OK\r\nContent-Length: " + std::to_string(contentLength) + "\r\n\r\n" +
+           std::string(bodyBytes, 'p');
+  }
+
+  VLTestServer m_Probe;
+};
+
+TEST_F(Bandwidth, AnAnnouncedMegabyteIsMeasuredOverItsFirst204800Bytes) {
+  Init();
+  unsigned int bits = 0;
+  // The server sends no more than 204800 bytes: a probe that waited for more would fail.
+  ASSERT_EQ(VL_WS_OK, Check(Canned(Answer(1000000, 204800)), &bits));
+  EXPECT_GT(bits, 0u);
+  EXPECT_LE(bits, 204800u * 8000u);
+  ASSERT_EQ(1u, m_Probe.Requests().size());
+  std::string request = m_Probe.Requests()[0];
+  EXPECT_EQ(0u, request.find("GET /speed/probe.bin HTTP/1.1\r\n"));
+  EXPECT_EQ("127.0.0.1:" + std::to_string(m_Probe.Port()), VLTestServer::Header(request, "Host"));
+  EXPECT_EQ("DUDUVud", VLTestServer::Header(request, "User-Agent"));
+
+  EXPECT_EQ(VL_WS_E_NETWORK, Check(Canned(Answer(1000000, 204799)), &bits));
+  EXPECT_EQ(0u, bits);
+}
+
+TEST_F(Bandwidth, ABodyThatCameWithTheHeaderCountsAsTimedInAtLeastOneMillisecond) {
+  Init();
+  unsigned int bits = 0;
+  ASSERT_EQ(VL_WS_OK, Check(Canned(Answer(100, 100)), &bits));
+  EXPECT_LE(bits, 800000u);  // 100 bytes in 1 millisecond at most
+  EXPECT_GE(bits, 8000u);
+}
+
+TEST_F(Bandwidth, FailuresOfTheProbe) {
+  Init();
+  struct {
+    std::string reply;
+    VL_WS_Status status;
+  } cases[] = {
+      {"HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n", VL_WS_E_HTTP_NOT_FOUND},
+      {"HTTP/1.1 503 Service Unavailable\r\nContent-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\n\r\nxyz", VL_WS_E_NETWORK},
+      {"", VL_WS_E_NETWORK},
+  };
+  unsigned int bits = 0;
+  for (const auto& c : cases) {
+    EXPECT_EQ(c.status, Check(Canned(c.reply), &bits)) << c.reply;
+    EXPECT_EQ(0u, bits);
+  }
+  EXPECT_EQ(VL_WS_E_CONNECT, Check("http://127.0.0.1:" + std::to_string(ClosedPort()) + "/probe", &bits));
+  for (const char* url : {"http://images.ostrel.example", "http://images.ostrel.example/", "images.ostrel.example/p",
+                          "http:///probe", "http://images.ostrel.example:http/probe"}) {
+    EXPECT_EQ(VL_WS_E_BANDWIDTH_BAD_URL, Check(url, &bits)) << url;
+    EXPECT_EQ(0u, bits);
+  }
+  VL_WS_Handle none = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_checkBandwidth(&none, &bits));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_checkBandwidth(&m_Handle, nullptr));
+}
+
+TEST_F(Bandwidth, TheProbeBypassesTheHandlesProxyAndRestoresIt) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.ProxyHost = "127.0.0.1";
+  params.ProxyPort = ClosedPort();
+  ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
+  const char* proxy = m_Handle.client->m_RealTimeBrowse.proxy_host;
+  ASSERT_NE(nullptr, proxy);
+  unsigned int bits = 0;
+  EXPECT_EQ(VL_WS_OK, Check(Canned(Answer(5000, 5000)), &bits));
+  EXPECT_EQ(proxy, m_Handle.client->m_RealTimeBrowse.proxy_host);
+  EXPECT_EQ(VL_WS_E_NETWORK, Check(Canned(""), &bits));
+  EXPECT_EQ(proxy, m_Handle.client->m_RealTimeBrowse.proxy_host);
+}
+
+TEST_F(Bandwidth, TheProbeURLComesFromTheStoresConfigurationOnce) {
+  Init();
+  unsigned int bits = 0;
+  ASSERT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
+  EXPECT_GT(bits, 0u);
+  EXPECT_STREQ(kStoreProbe, m_Handle.client->m_Params.BandwithCheckURL.c_str());
+  std::vector<VLSimRequest> requests = Requests(2);
+  ASSERT_EQ(2u, requests.size());
+  EXPECT_EQ("getConfig", requests[0].operation);
+  EXPECT_EQ("bandwidth probe", requests[1].note);
+
+  m_Sim.ClearRequests();
+  ASSERT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
+  requests = Requests(1);
+  ASSERT_EQ(1u, requests.size());
+  EXPECT_EQ("bandwidth probe", requests[0].note);
+}
+
+TEST_F(Bandwidth, TheLastProbeKeyInAnyLetterCaseWins) {
+  std::string canned = Canned(Answer(5000, 5000));
+  m_Sim.Store().SetConfigItem("BANDWITHCHECKURL", canned);
+  Init();
+  unsigned int bits = 0;
+  EXPECT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
+  EXPECT_EQ(canned, m_Handle.client->m_Params.BandwithCheckURL.c_str());
+  EXPECT_EQ(1u, m_Probe.Requests().size());
+}
+
+TEST_F(Bandwidth, AConfigurationWithoutProbeOrNoConfigurationAtAll) {
+  Init();
+  unsigned int bits = 12345;
+  Fault("getConfig=status:503,times=1");
+  EXPECT_EQ(VL_WS_E_HTTP_STATUS(503), VL_WS_checkBandwidth(&m_Handle, &bits));
+  EXPECT_EQ(0u, bits);
+  m_Sim.Store().SetConfigItem("BandwithCheckURL", "");
+  EXPECT_EQ(VL_WS_E_BANDWIDTH_NO_URL, VL_WS_checkBandwidth(&m_Handle, &bits));
+  EXPECT_STREQ("", m_Handle.client->m_Params.BandwithCheckURL.c_str());
+}
+
+TEST_F(Bandwidth, TheStoresProbeOnTheImageHost) {
+  Init();
+  unsigned int bits = 0;
+  ASSERT_EQ(VL_WS_OK, Check(kStoreProbe, &bits));
+  EXPECT_GT(bits, 0u);
+  VLSimRequest probe = Requests(1).back();
+  EXPECT_EQ("images.ostrel.example", probe.host);
+  EXPECT_EQ("/speedtest/probe.bin", probe.path);
+  EXPECT_EQ("DUDUVud", probe.userAgent);
+  EXPECT_EQ("bandwidth probe", probe.note);
+  Fault("/speedtest/=status:404,times=1");
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Check(kStoreProbe, &bits));
+}
+
+// Times of the store's clock, as seconds since 1970 UTC.
+const time_t k20101231_235959 = 1293839999;
+const time_t k20110101_000500 = 1293840300;
+const time_t k20110615_123000 = 1308141000;
+const time_t k20110615_010203 = 1308099723;
+
+TEST_F(Device, ServerTimeReadsTheStoresTwelveHourClock) {
+  // 11:59:59 PM, 12:05:00 AM, 12:30:00 PM and 1:02:03 AM
+  for (time_t now : {k20101231_235959, k20110101_000500, k20110615_123000, k20110615_010203}) {
+    m_Sim.Store().SetNow(now);
+    time_t got = 0;
+    EXPECT_EQ(VL_WS_OK, VL_WS_getServerTime(&got));
+    EXPECT_EQ(now, got);
+  }
+  std::vector<VLSimRequest> requests = Requests(4);
+  ASSERT_EQ(4u, requests.size());
+  EXPECT_EQ("store.ostrel.example", requests[0].host);
+  EXPECT_EQ("/device/time/", requests[0].path);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getServerTime(nullptr));
+}
+
+TEST_F(Device, ServerTimeFailuresLeaveTheTimeUnknown) {
+  struct {
+    const char* fault;
+    VL_WS_Status status;
+  } cases[] = {
+      {"/device/time/=status:503,times=1", VL_WS_E_NETWORK},
+      {"/device/time/=status:404,times=1", VL_WS_E_NETWORK},
+      {"/device/time/=close,times=1", VL_WS_E_NETWORK},
+      {"/device/time/=truncated,times=1", VL_WS_E_UNEXPECTED},  // "12/31/2010 " has three fields
+      {"/device/time/=badlength:64,times=1", VL_WS_E_UNEXPECTED},
+  };
+  m_Sim.Store().SetNow(k20101231_235959);
+  for (const auto& c : cases) {
+    Fault(c.fault);
+    time_t got = 0;
+    EXPECT_EQ(c.status, VL_WS_getServerTime(&got)) << c.fault;
+    EXPECT_EQ(-1, got) << c.fault;
+  }
+}
+
+TEST_F(Device, LocalAddressIsTheLocalEndOfAConnectionToTheService) {
+  Init();
+  VL_WS_String address;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getLocalIPAddr(&m_Handle, &address));
+  EXPECT_STREQ("127.0.0.1", address.Text);
+  EXPECT_EQ(9, address.Length);
+  VL_WS_release(&address);
+
+  VLString& base = m_Handle.client->m_Params.ServiceBaseURL;
+  VLString saved = base;
+  base = "https://no-path-here";
+  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getLocalIPAddr(&m_Handle, &address));
+  VL_WS_release(&address);
+  base = ("http://127.0.0.1:" + std::to_string(ClosedPort()) + "/api/").c_str();
+  EXPECT_EQ(VL_WS_E_CONNECT, VL_WS_getLocalIPAddr(&m_Handle, &address));
+  EXPECT_EQ(nullptr, address.Text);
+  VL_WS_release(&address);
+  base = saved;
+
+  VL_WS_Handle none = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getLocalIPAddr(&none, &address));
+  EXPECT_NE(nullptr, address.tag);
+  VL_WS_release(&address);
+}
+
+TEST_F(Device, UserAgentIsTheHandlesOwn) {
+  Init();
+  VL_WS_String agent;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getUserAgent(&m_Handle, &agent));
+  EXPECT_STREQ("VLSDK: fw-2.1|rev-7 VLMODEL:BDP-1", agent.Text);
+  VL_WS_release(&agent);
+
+  // A handle without client state leaves the record untouched.
+  VL_WS_Handle none = {};
+  VL_WS_String untouched = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getUserAgent(&none, &untouched));
+  EXPECT_EQ(nullptr, untouched.tag);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getUserAgent(&m_Handle, nullptr));
+}
+
+TEST(DeviceIdentifier, SixUpperCaseHexadecimalPairs) {
+  VL_WS_String id;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getDestinationUniqueID(&id));
+  EXPECT_TRUE(std::regex_match(id.Text, std::regex("[0-9A-F]{2}(-[0-9A-F]{2}){5}"))) << id.Text;
+  EXPECT_EQ(17, id.Length);
+  VL_WS_release(&id);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getDestinationUniqueID(nullptr));
+}
+
+}  // namespace
