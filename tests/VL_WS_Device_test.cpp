@@ -42,6 +42,11 @@ class HttpContext : public soap {
     socket_flags = MSG_NOSIGNAL;
     VLSoapTransport::Install(this);
   }
+  // A failed connection leaves its fault record in the context.
+  ~HttpContext() {
+    soap_destroy(this);
+    soap_end(this);
+  }
 };
 
 class HttpGet : public testing::Test {

@@ -128,6 +128,7 @@ TEST(Settings, MissingFilesKeysAndArgumentsHaveTheirStatuses) {
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, ReadSetting("", "A", false).status);
   VL_WS_String value;
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_readSetting(nullptr, "A", &value, false));
+  VL_WS_release(&value);
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_readSetting(file.c_str(), nullptr, &value, false));
   VL_WS_release(&value);
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_readSetting(file.c_str(), "A", nullptr, false));
