@@ -13,20 +13,18 @@ extern "C" VL_WS_Status VL_WS_getFileType(VL_WS_Handle* handle, VL_WS_FileType* 
   VL_WS_Client* client = VLClientFor(handle, fileType);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
 
-  int soapError = VLPlainCall(client->m_RealTimeBrowse, "getFileType", soap_new__VL1__getFileType,
-                              soap_new__VL1__getFileTypeResponse, &RealTimeBrowse::getFileType,
-                              [&](const _VL1__getFileTypeResponse& response) {
-                                if (response.getFileTypeResult == 0) return;
-                                const VL1__FileType& answer = *response.getFileTypeResult;
-                                fileType->File_DRMProvider = answer.File_USCOREDRMProvider;
-                                fileType->File_AccessType = answer.File_USCOREAccessType;
-                                fileType->File_FileProfile = answer.File_USCOREFileProfile;
-                                fileType->File_VideoFormat = answer.File_USCOREVideoFormat;
-                                fileType->File_FileExtension = answer.File_USCOREFileExtension;
-                                // Read by the operations that choose their service themselves;
-                                // the dispatcher keeps the type it was made with.
-                                client->m_Params.AccessType = static_cast<VL_WS_AccessType>(answer.File_USCOREAccessType);
-                              });
+  int soapError = VLServiceCall(
+      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getFileType), VLNoFields(),
+      [&](const VL1__FileType& answer) {
+        fileType->File_DRMProvider = answer.File_USCOREDRMProvider;
+        fileType->File_AccessType = answer.File_USCOREAccessType;
+        fileType->File_FileProfile = answer.File_USCOREFileProfile;
+        fileType->File_VideoFormat = answer.File_USCOREVideoFormat;
+        fileType->File_FileExtension = answer.File_USCOREFileExtension;
+        // Read by the operations that choose their service themselves; the dispatcher keeps the
+        // type it was made with.
+        client->m_Params.AccessType = static_cast<VL_WS_AccessType>(answer.File_USCOREAccessType);
+      });
   VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, ret:%d\n", "VL_WS_getFileType", soapError);
   return VLUtilities::To_VL_WS_Status(soapError);
 }

@@ -1,6 +1,6 @@
 // Freshness of a handle's cache: the store's last catalogue load time and the refresh of the
 // cached kinds of data.
-#include "VLCachedCall.h"
+#include "VL_WS_Call.h"
 #include "VLRecord.h"
 #include "VLUtilities.h"
 #include "VLWSAELog.h"
@@ -13,12 +13,10 @@ extern "C" VL_WS_Status VL_WS_getLastCacheLoadTimeUTC(VL_WS_Handle* handle, VL_W
   VL_WS_Client* client = VLClientFor(handle, utcTime);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
 
-  int soapError = VLPlainCall(client->m_RealTimeBrowse, "getLastCacheLoadTimeUTC",
-                              soap_new__VL1__getLastCacheLoadTimeUTC, soap_new__VL1__getLastCacheLoadTimeUTCResponse,
-                              &RealTimeBrowse::getLastCacheLoadTimeUTC,
-                              [&](const _VL1__getLastCacheLoadTimeUTCResponse& response) {
-                                VLRecordSetString(*utcTime, response.getLastCacheLoadTimeUTCResult);
-                              });
+  // A text result reaches the converter as its first character.
+  int soapError = VLServiceCall(*client, client->m_RealTimeBrowse,
+                                VL_SERVICE_OPERATION(RealTimeBrowse, getLastCacheLoadTimeUTC), VLNoFields(),
+                                [&](const char& text) { VLRecordSetString(*utcTime, &text); });
   VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, ret:%d,utctime:%s\n", "VL_WS_getLastCacheLoadTimeUTC", soapError,
                         utcTime->Text ? utcTime->Text : "");
   return VLUtilities::To_VL_WS_Status(soapError);

@@ -1,9 +1,9 @@
 // Catalogue operations of the client: the genre tree, pages of titles, title and episode details,
 // search, recommendations and the translation of TiVo and SKU identifiers, all answered by the
-// catalogue service and, where they are cached, by the handle's cache first (VLCachedCall.h).
+// catalogue service and, where they are cached, by the handle's cache first (VLCachedCall.h, VL_WS_Call.h).
 #include <string.h>
 
-#include "VLCachedCall.h"
+#include "VL_WS_Call.h"
 #include "VLRecord.h"
 #include "VLUtilities.h"
 #include "VLWSAELog.h"
@@ -15,39 +15,6 @@ namespace {
 
 VLLogArea s_Log(VLWSAELOG_AREA_NAME);
 
-// Tags the out-record (before anything else, so that it can always be released) and returns the
-// handle's client state; null when the record or the client state is missing.
-template <class Record>
-VL_WS_Client* Begin(VL_WS_Handle* handle, Record* record) {
-  if (record == 0) return 0;
-  VLRecordInit(*record);
-  return VLClientOf(handle);
-}
-
-// The end of an operation whose status folds the record's response code: a non-zero code gives
-// VL_WS_E_UNEXPECTED.
-VL_WS_Status CodeFolded(const char* name, int soapError, int responseCode) {
-  VLLogCallResult(name, soapError, responseCode);
-  return VLUtilities::To_VL_WS_Status(soapError, responseCode, "");
-}
-
-// The end of an operation whose status is the SOAP error's alone; the caller reads the response
-// code in the record.
-VL_WS_Status SoapOnly(const char* name, int soapError, int responseCode) {
-  VLLogCallResult(name, soapError, responseCode);
-  return VLUtilities::To_VL_WS_Status(soapError);
-}
-
-// A converter of answers that carry a response code: fills record; the answer is worth keeping
-// when the code is 0.
-template <class Result, class Record>
-auto CodedAnswer(void (*convert)(const Result*, Record&), Record& record) {
-  return [convert, &record](const Result& result) {
-    convert(&result, record);
-    return result.ResponseCode == 0;
-  };
-}
-
 bool InWishlist(const VL1__TitleListingResponse& details) { return details.IsAvailInUserWishList == true_; }
 
 // getTitleListing and getTvEpisodeListing: the details of one title or episode, cached by the
@@ -56,16 +23,16 @@ bool InWishlist(const VL1__TitleListingResponse& details) { return details.IsAva
 template <class Operation, class Fill, class WishlistTitle>
 VL_WS_Status TitleDetails(const char* name, const char* cacheName, const Operation& operation, VL_WS_Handle* handle,
                           int id, VL_WS_TitleListingResponse* details, Fill fill, WishlistTitle wishlistTitle) {
-  VL_WS_Client* client = Begin(handle, details);
+  VL_WS_Client* client = VLClientFor(handle, details);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, cacheName, VLCacheKey("%d", id)};
   int soapError = VLCachedCall(
       *client, client->m_RealTimeBrowse, operation, &entry, fill,
-      CodedAnswer(VLUtilities::VL1__TitleListingResponse2VL_WS_TitleListingResponse, *details),
+      VLKeptInto(VLUtilities::VL1__TitleListingResponse2VL_WS_TitleListingResponse, *details),
       [&](CacheInterface& cache, const VL1__TitleListingResponse& result) {
         cache.WriteWishlistFlag(wishlistTitle(result), InWishlist(result));
       });
-  return CodeFolded(name, soapError, details->ResponseCode);
+  return VLFoldedStatus(name, soapError, details->ResponseCode);
 }
 
 // searchForTitle and searchForTitleDetail: one page of the titles that match a query.
@@ -73,7 +40,7 @@ template <class Operation>
 VL_WS_Status Search(const char* name, const char* cacheName, const Operation& operation, VL_WS_Handle* handle,
                     int currentPageNumber, int itemsPerPage, int purchaseType, int titleType, const char* query,
                     VL_WS_TitlesResponse* titles) {
-  VL_WS_Client* client = Begin(handle, titles);
+  VL_WS_Client* client = VLClientFor(handle, titles);
   if (client == 0 || query == 0 || *query == 0) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, cacheName,
                         VLCacheKey("%d,%d,%d,%d,%s", currentPageNumber, itemsPerPage, purchaseType, titleType, query)};
@@ -86,14 +53,14 @@ VL_WS_Status Search(const char* name, const char* cacheName, const Operation& op
         request.PurchaseType = static_cast<VL1__StreamAPIPurchaseType>(purchaseType);
         request.TitleType = static_cast<VL1__TitleTypeFilter>(titleType);
       },
-      CodedAnswer(VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles));
-  return SoapOnly(name, soapError, titles->ResponseCode);
+      VLKeptInto(VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles));
+  return VLSoapStatus(name, soapError, titles->ResponseCode);
 }
 
 }  // namespace
 
 extern "C" VL_WS_Status VL_WS_getNavigation(VL_WS_Handle* handle, VL_WS_GenreArray* genres) {
-  VL_WS_Client* client = Begin(handle, genres);
+  VL_WS_Client* client = VLClientFor(handle, genres);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   // One genre tree per cache: the Key is empty.
   VLCacheEntry entry = {VLCacheKind::kMetaData, "getNavigation", VLString()};
@@ -108,18 +75,18 @@ extern "C" VL_WS_Status VL_WS_getNavigation(VL_WS_Handle* handle, VL_WS_GenreArr
 }
 
 extern "C" VL_WS_Status VL_WS_getGenreLabel(VL_WS_Handle* handle, int genreID, VL_WS_GenreLabelResponse* label) {
-  VL_WS_Client* client = Begin(handle, label);
+  VL_WS_Client* client = VLClientFor(handle, label);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   int soapError = VLServiceCall(
       *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getGenreLabel),
       [&](_VL1__getGenreLabel& request) { request.GenreID = genreID; },
-      CodedAnswer(VLUtilities::VL1__GetGenreLabelResponse2VL_WS_GenreLabelResponse, *label));
-  return CodeFolded("VL_WS_getGenreLabel", soapError, label->ResponseCode);
+      VLKeptInto(VLUtilities::VL1__GetGenreLabelResponse2VL_WS_GenreLabelResponse, *label));
+  return VLFoldedStatus("VL_WS_getGenreLabel", soapError, label->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_getTitles(VL_WS_Handle* handle, int genreID, int currentPageNumber, int itemsPerPage,
                                         int purchaseType, VL_WS_TitlesResponse* titles) {
-  VL_WS_Client* client = Begin(handle, titles);
+  VL_WS_Client* client = VLClientFor(handle, titles);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, "getTitles",
                         VLCacheKey("%d,%d,%d,%d", genreID, currentPageNumber, itemsPerPage, purchaseType)};
@@ -131,14 +98,14 @@ extern "C" VL_WS_Status VL_WS_getTitles(VL_WS_Handle* handle, int genreID, int c
         request.ItemsPerPage = itemsPerPage;
         request.PurchaseType = static_cast<VL1__StreamAPIPurchaseType>(purchaseType);
       },
-      CodedAnswer(VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles));
-  return CodeFolded("VL_WS_getTitles", soapError, titles->ResponseCode);
+      VLKeptInto(VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles));
+  return VLFoldedStatus("VL_WS_getTitles", soapError, titles->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_getTitlesByGenreIDs(VL_WS_Handle* handle, int count, const int* genreIDs,
                                                   int currentPageNumber, int itemsPerPage, int purchaseType,
                                                   VL_WS_TitlesResponseArray* pages) {
-  VL_WS_Client* client = Begin(handle, pages);
+  VL_WS_Client* client = VLClientFor(handle, pages);
   if (client == 0 || count < 1 || genreIDs == 0) return VL_WS_E_INVALID_ARGUMENT;
   soap& context = client->m_RealTimeBrowse;
   int soapError = VLServiceCall(
@@ -158,7 +125,7 @@ extern "C" VL_WS_Status VL_WS_getTitlesByGenreIDs(VL_WS_Handle* handle, int coun
       [&](const VL1__ArrayOfGetTitlesResponse& result) {
         VLUtilities::VL1__ArrayOfGetTitlesResponse2VL_WS_TitlesResponseArray(&result, *pages);
       });
-  return SoapOnly("VL_WS_getTitlesByGenreIDs", soapError, pages->Count > 0 ? pages->Items[0].ResponseCode : 0);
+  return VLSoapStatus("VL_WS_getTitlesByGenreIDs", soapError, pages->Count > 0 ? pages->Items[0].ResponseCode : 0);
 }
 
 extern "C" VL_WS_Status VL_WS_getTitleListing(VL_WS_Handle* handle, int titleID, VL_WS_TitleListingResponse* details) {
@@ -178,19 +145,19 @@ extern "C" VL_WS_Status VL_WS_getTvEpisodeListing(VL_WS_Handle* handle, int epis
 
 extern "C" VL_WS_Status VL_WS_getTvEpisodeListByTitleID(VL_WS_Handle* handle, int titleID,
                                                         VL_WS_TvEpisodeListResponse* episodes) {
-  VL_WS_Client* client = Begin(handle, episodes);
+  VL_WS_Client* client = VLClientFor(handle, episodes);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, "getTvEpisodeListByTitleID", VLCacheKey("%d", titleID)};
   int soapError = VLCachedCall(
       *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getTvEpisodeListByTitleID), &entry,
       [&](_VL1__getTvEpisodeListByTitleID& request) { request.TitleID = titleID; },
-      CodedAnswer(VLUtilities::VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse, *episodes));
-  return CodeFolded("VL_WS_getTvEpisodeListByTitleID", soapError, episodes->ResponseCode);
+      VLKeptInto(VLUtilities::VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse, *episodes));
+  return VLFoldedStatus("VL_WS_getTvEpisodeListByTitleID", soapError, episodes->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_getAllTvEpisodeListings(VL_WS_Handle* handle, int titleID,
                                                       VL_WS_TitleListingResponseArray* listings) {
-  VL_WS_Client* client = Begin(handle, listings);
+  VL_WS_Client* client = VLClientFor(handle, listings);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, "getAllTvEpisodeListings", VLCacheKey("%d", titleID)};
   int soapError = VLCachedCall(
@@ -215,32 +182,32 @@ extern "C" VL_WS_Status VL_WS_getAllTvEpisodeListings(VL_WS_Handle* handle, int 
         }
         cache.WriteWishlistFlags(titles, flags);
       });
-  return SoapOnly("VL_WS_getAllTvEpisodeListings", soapError,
+  return VLSoapStatus("VL_WS_getAllTvEpisodeListings", soapError,
                   listings->Count > 0 ? listings->Items[0].ResponseCode : 0);
 }
 
 extern "C" VL_WS_Status VL_WS_translateTivoExternalID(VL_WS_Handle* handle, const char* tivoExternalID,
                                                       VL_WS_TranslateTivoExternalIDResponse* translation) {
-  VL_WS_Client* client = Begin(handle, translation);
+  VL_WS_Client* client = VLClientFor(handle, translation);
   if (client == 0 || tivoExternalID == 0) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, "translateTivoExternalId", VLCacheKey("%s", tivoExternalID)};
   int soapError = VLCachedCall(
       *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, translateTivoExternalId), &entry,
       [&](_VL1__translateTivoExternalId& request) { request.TivoExternalId = const_cast<char*>(tivoExternalID); },
-      CodedAnswer(VLUtilities::VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExternalIDResponse,
+      VLKeptInto(VLUtilities::VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExternalIDResponse,
                   *translation));
-  return SoapOnly("VL_WS_translateTivoExternalID", soapError, translation->ResponseCode);
+  return VLSoapStatus("VL_WS_translateTivoExternalID", soapError, translation->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_translateSkuID(VL_WS_Handle* handle, int skuID, VL_WS_TranslateSkuIDResponse* translation) {
-  VL_WS_Client* client = Begin(handle, translation);
+  VL_WS_Client* client = VLClientFor(handle, translation);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, "translateSkuId", VLCacheKey("%d", skuID)};
   int soapError = VLCachedCall(
       *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, translateSkuId), &entry,
       [&](_VL1__translateSkuId& request) { request.SkuId = skuID; },
-      CodedAnswer(VLUtilities::VL1__TranslateSkuIdResponse2VL_WS_TranslateSkuIDResponse, *translation));
-  return SoapOnly("VL_WS_translateSkuID", soapError, translation->ResponseCode);
+      VLKeptInto(VLUtilities::VL1__TranslateSkuIdResponse2VL_WS_TranslateSkuIDResponse, *translation));
+  return VLSoapStatus("VL_WS_translateSkuID", soapError, translation->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_searchForTitle(VL_WS_Handle* handle, int currentPageNumber, int itemsPerPage,
@@ -260,12 +227,12 @@ extern "C" VL_WS_Status VL_WS_searchForTitleDetail(VL_WS_Handle* handle, int cur
 
 extern "C" VL_WS_Status VL_WS_getRecommendedTitles(VL_WS_Handle* handle, int titleID,
                                                    VL_WS_RecommendedTitlesResponse* titles) {
-  VL_WS_Client* client = Begin(handle, titles);
+  VL_WS_Client* client = VLClientFor(handle, titles);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, "getRecommendedTitles", VLCacheKey("%d", titleID)};
   int soapError = VLCachedCall(
       *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getRecommendedTitles), &entry,
       [&](_VL1__getRecommendedTitles& request) { request.TitleId = titleID; },
-      CodedAnswer(VLUtilities::VL1__RecommendedTitlesResponse2VL_WS_RecommendedTitlesResponse, *titles));
-  return CodeFolded("VL_WS_getRecommendedTitles", soapError, titles->ResponseCode);
+      VLKeptInto(VLUtilities::VL1__RecommendedTitlesResponse2VL_WS_RecommendedTitlesResponse, *titles));
+  return VLFoldedStatus("VL_WS_getRecommendedTitles", soapError, titles->ResponseCode);
 }

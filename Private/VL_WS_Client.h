@@ -1,9 +1,8 @@
 // VL_WS_Client.h: the client state behind a VL_WS_Handle (tag 1). One block per handle, never
 // shared: its three SOAP service objects, the dispatcher of account operations, the handle's
 // own settings and its cache. Also the steps that the client operations share: tag the
-// out-record and find the client (VLClientFor), prepare a SOAP call in a service's context
-// (VLPrepareCall), end it (VLEndCall), or all of it for a plain call (VLPlainCall); each
-// operation then logs its result line and returns VLUtilities::To_VL_WS_Status of the call.
+// out-record and find the client (VLClientFor) and end a SOAP call (VLEndCall); the call itself
+// is VLCachedCall.h's.
 #ifndef VL_WS_CLIENT_H
 #define VL_WS_CLIENT_H
 
@@ -39,41 +38,11 @@ VL_WS_Client* VLClientFor(const VL_WS_Handle* handle, Record* record) {
   return VLClientOf(handle);
 }
 
-// Prepares one SOAP call of an operation on a service object (or the dispatcher): makes its
-// request and response records in the service's context with the generated functions
-// newRequest and newResponse (soap_new__VL1__<operation>, ...Response), and the header of the
-// operation (Setup with its SOAP name). Returns SOAP_OK, or the error that ends the call; either
-// way the call ends with VLEndCall.
-template <class Service, class Request, class Response>
-int VLPrepareCall(Service& service, const char* operation, Request* (*newRequest)(soap*, int),
-                  Response* (*newResponse)(soap*, int), Request*& request, Response*& response) {
-  soap& context = service;
-  request = newRequest(&context, -1);
-  response = newResponse(&context, -1);
-  if (request == 0 || response == 0) return SOAP_EOM;
-  return service.Setup(operation);
-}
-
 // Ends one SOAP call on a service context: deletes the call's request and response records and
 // everything else the call allocated in the context (the reply's header and texts included) and
 // ends the context's message state. Nothing of the reply may be used afterwards. Every
 // operation runs it once per call, whatever the call's outcome.
 void VLEndCall(soap& context);
-
-// The plain call of an operation whose request has no fields: prepares the call, calls the
-// service's operation (call, e.g. &RealTimeBrowse::getFileType), lets convert read the response
-// when the call succeeded, and ends the call. Returns the SOAP error.
-template <class Service, class Proxy, class Request, class Response, class Convert>
-int VLPlainCall(Service& service, const char* operation, Request* (*newRequest)(soap*, int),
-                Response* (*newResponse)(soap*, int), int (Proxy::*call)(Request*, Response*), Convert convert) {
-  Request* request;
-  Response* response;
-  int error = VLPrepareCall(service, operation, newRequest, newResponse, request, response);
-  if (error == SOAP_OK) error = (service.*call)(request, response);
-  if (error == SOAP_OK) convert(*response);
-  VLEndCall(service);
-  return error;
-}
 
 // Frees a handle's client state: closes and deletes its cache, then destroys its settings, the
 // dispatcher and the three service objects. VL_WS_release calls it for a handle that has one.
