@@ -1,7 +1,7 @@
 // VLHttpGet: one small hand-built HTTP/1.1 request of the library (the server time, the bandwidth
-// probe) over the connection of a SOAP context (VLTransportConnection): send the request,
-// receive the first piece of the answer once, check its status line and "Content-Length", and
-// find the body. A body longer than the first piece is read on with Receive.
+// probe, box-art images) over the connection of a SOAP context (VLTransportConnection): send the
+// request, receive the first piece of the answer once, check its status line and
+// "Content-Length", and find the body. A body longer than the first piece is read on with Receive.
 //
 // The answer must start with "HTTP/1.1 200 OK\r\n" (or one of the other statuses of Result),
 // and its whole header, with a "Content-Length" above 0, must come in the first piece. The

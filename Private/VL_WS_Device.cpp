@@ -194,18 +194,11 @@ extern "C" VL_WS_Status VL_WS_getLocalIPAddr(VL_WS_Handle* handle, VL_WS_String*
   return VL_WS_OK;
 }
 
-extern "C" VL_WS_Status VL_WS_getServerTime(time_t* serverTime) {
-  if (serverTime == 0) return VL_WS_E_INVALID_ARGUMENT;
-  *serverTime = -1;
-  // A context of its own: the call needs no handle.
-  soap context(SOAP_C_UTFSTRING);
-  context.send_timeout = 30;
-  context.connect_timeout = 30;
-  context.recv_timeout = 88;
-  context.socket_flags = MSG_NOSIGNAL;
-  VLSoapTransport::Install(&context);
+namespace {
 
-  VLHttpGet get(&context);
+// One question to the store's time service on context: the time, or the status of the failure.
+VL_WS_Status AskServerTime(soap* context, time_t* serverTime) {
+  VLHttpGet get(context);
   VLString request = VLString("GET ") + kTimePath + " HTTP/1.1\r\n";
   request += "User-Agent: DUDUVud\r\nHost: " VL_STORE_PRODUCTION_HOST "\r\n\r\n";
   VLString url = VLString("http://" VL_STORE_PRODUCTION_HOST) + kTimePath;
@@ -217,8 +210,27 @@ extern "C" VL_WS_Status VL_WS_getServerTime(time_t* serverTime) {
     default:
       return VL_WS_E_NETWORK;
   }
-  time_t when = -1;
-  if (get.BodyReceived() < get.ContentLength() || !ParseServerTime(get.Body(), &when)) return VL_WS_E_UNEXPECTED;
-  *serverTime = when;
+  if (get.BodyReceived() < get.ContentLength() || !ParseServerTime(get.Body(), serverTime)) return VL_WS_E_UNEXPECTED;
   return VL_WS_OK;
+}
+
+}  // namespace
+
+extern "C" VL_WS_Status VL_WS_getServerTime(time_t* serverTime) {
+  if (serverTime == 0) return VL_WS_E_INVALID_ARGUMENT;
+  *serverTime = -1;
+  // A context of its own: the call needs no handle.
+  soap context(SOAP_C_UTFSTRING);
+  context.send_timeout = 30;
+  context.connect_timeout = 30;
+  context.recv_timeout = 88;
+  context.socket_flags = MSG_NOSIGNAL;
+  VLSoapTransport::Install(&context);
+  time_t when = -1;
+  VL_WS_Status status = AskServerTime(&context, &when);
+  if (status == VL_WS_OK) *serverTime = when;
+  // A failed connection leaves its fault record in the context.
+  soap_destroy(&context);
+  soap_end(&context);
+  return status;
 }
