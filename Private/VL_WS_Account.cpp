@@ -75,23 +75,15 @@ extern "C" VL_WS_Status VL_WS_checkAuthToken(VL_WS_Handle* handle, bool* valid) 
 }
 
 extern "C" VL_WS_Status VL_WS_getEmailAddress(VL_WS_Handle* handle, VL_WS_EmailAddressResponse* answer) {
-  VL_WS_Client* client = VLClientFor(handle, answer);
-  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kUserData, "getEmailAddress", VLString()};
-  int soapError = VLCachedCall(
-      *client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, getEmailAddress), &entry,
-      VLNoFields(), VLKeptInto(VLUtilities::VL1__GetEmailAddressResponse2VL_WS_EmailAddressResponse, *answer));
-  return VLFoldedStatus("VL_WS_getEmailAddress", soapError, answer->ResponseCode);
+  return VLKeptAccountRecord(handle, answer, "VL_WS_getEmailAddress",
+                             VL_SERVICE_OPERATION(StreamDownloadAPI, getEmailAddress),
+                             VLUtilities::VL1__GetEmailAddressResponse2VL_WS_EmailAddressResponse);
 }
 
 extern "C" VL_WS_Status VL_WS_getSettingsPageInfo(VL_WS_Handle* handle, VL_WS_SettingsPageResponse* answer) {
-  VL_WS_Client* client = VLClientFor(handle, answer);
-  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kUserData, "getSettingsPageInfo", VLString()};
-  int soapError = VLCachedCall(*client, client->m_StreamDownloadAPI,
-                               VL_SERVICE_OPERATION(StreamDownloadAPI, getSettingsPageInfo), &entry, VLNoFields(),
-                               VLKeptInto(VLUtilities::VL1__SettingsPageInfo2VL_WS_SettingsPageResponse, *answer));
-  return VLFoldedStatus("VL_WS_getSettingsPageInfo", soapError, answer->ResponseCode);
+  return VLKeptAccountRecord(handle, answer, "VL_WS_getSettingsPageInfo",
+                             VL_SERVICE_OPERATION(StreamDownloadAPI, getSettingsPageInfo),
+                             VLUtilities::VL1__SettingsPageInfo2VL_WS_SettingsPageResponse);
 }
 
 extern "C" VL_WS_Status VL_WS_getConfig(VL_WS_Handle* handle, VL_WS_ConfigResponse* config) {

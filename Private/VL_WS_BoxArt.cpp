@@ -5,6 +5,7 @@
 
 #include "BoxArtDownloader.h"
 #include "VLFile.h"
+#include "VLProxySuspension.h"
 #include "VLRecord.h"
 #include "VLUtilities.h"
 #include "VL_WS.h"
@@ -13,21 +14,6 @@
 namespace {
 
 enum { kNoCache = 0, kMemoryCache = 1, kFileCache = 2 };
-
-// Clears a context's HTTP proxy for the scope: images are fetched from the image host directly.
-class ProxySuspension {
- public:
-  explicit ProxySuspension(soap& context) : m_Soap(context), m_ProxyHost(context.proxy_host) {
-    context.proxy_host = 0;
-  }
-  ~ProxySuspension() { m_Soap.proxy_host = m_ProxyHost; }
-  ProxySuspension(const ProxySuspension&) = delete;
-  ProxySuspension& operator=(const ProxySuspension&) = delete;
-
- private:
-  soap& m_Soap;
-  const char* m_ProxyHost;
-};
 
 // One image asked of a client: its cache row, and the downloads that fill or revalidate it.
 // Every download goes through the catalogue context, without its proxy.
@@ -121,7 +107,7 @@ class BoxArtRequest {
   VL_WS_Client* m_Client;
   VLString m_Prefix;
   VL_WS_BoxArtSize m_Size;
-  ProxySuspension m_Proxy;
+  VLProxySuspension m_Proxy;
   BoxArtDownloader m_Downloader;
   int m_CacheType;  // the cache's type when it stores box art, else kNoCache
   VLString m_FileName;

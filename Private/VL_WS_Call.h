@@ -40,9 +40,8 @@ auto VLInto(void (*convert)(const Result*, Record&), Record& record, bool* answe
 // The same for VLCachedCall: the answer is worth keeping when its response code is 0.
 template <class Result, class Record>
 auto VLKeptInto(void (*convert)(const Result*, Record&), Record& record, bool* answered = nullptr) {
-  return [convert, &record, answered](const Result& result) {
-    convert(&result, record);
-    if (answered != nullptr) *answered = true;
+  return [into = VLInto(convert, record, answered)](const Result& result) {
+    into(result);
     return result.ResponseCode == 0;
   };
 }
@@ -59,6 +58,20 @@ VL_WS_Status VLSoapStatus(const char* name, int soapError, int responseCode);
 // those whose status is the SOAP error's alone.
 void VLLogBoolResult(const char* name, bool value);
 VL_WS_Status VLBoolStatus(const char* name, int soapError, bool value);
+
+// An account record of an operation without request fields, kept as user data under the
+// operation's name with an empty Key: fills record with convert and returns VLFoldedStatus of
+// name and statusRow.
+template <class Operation, class Result, class Record>
+VL_WS_Status VLKeptAccountRecord(VL_WS_Handle* handle, Record* record, const char* name, const Operation& op,
+                                 void (*convert)(const Result*, Record&), const char* statusRow = "") {
+  VL_WS_Client* client = VLClientFor(handle, record);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  VLCacheEntry entry = {VLCacheKind::kUserData, op.name, VLString()};
+  int soapError = VLCachedCall(*client, client->m_StreamDownloadAPI, op, &entry, VLNoFields(),
+                               VLKeptInto(convert, *record));
+  return VLFoldedStatus(name, soapError, record->ResponseCode, statusRow);
+}
 
 // True when an answer may change state: the call succeeded, the answer had its result element
 // and the store's response code is 0.

@@ -10,6 +10,7 @@
 #include <time.h>
 
 #include "VLHttpGet.h"
+#include "VLProxySuspension.h"
 #include "VLRecord.h"
 #include "VLSoapTransport.h"
 #include "VLStoreHosts.h"
@@ -41,22 +42,6 @@ VL_WS_Status ConfiguredProbeURL(VL_WS_Handle* handle, VLString* url) {
   VL_WS_release(&config);
   return status;
 }
-
-// Lets a context's connections go directly to their hosts for the lifetime of the object: the
-// proxy host is cleared and restored at the end.
-class DirectConnections {
- public:
-  explicit DirectConnections(soap* context) : m_Context(context), m_ProxyHost(context->proxy_host) {
-    context->proxy_host = 0;
-  }
-  ~DirectConnections() { m_Context->proxy_host = m_ProxyHost; }
-  DirectConnections(const DirectConnections&) = delete;
-  DirectConnections& operator=(const DirectConnections&) = delete;
-
- private:
-  soap* m_Context;
-  const char* m_ProxyHost;
-};
 
 // The store's clock as the time service writes it: "month/day/year hour:minute:second AM|PM"
 // in UTC, the hour on the 12-hour clock. False when fewer than the seven fields are there or a
@@ -121,7 +106,7 @@ extern "C" VL_WS_Status VL_WS_checkBandwidth(VL_WS_Handle* handle, unsigned int*
   VLHttpURL url;
   if (!VLHttpGet::SplitURL(probeURL.c_str(), &url)) return VL_WS_E_BANDWIDTH_BAD_URL;
 
-  DirectConnections direct(&client->m_RealTimeBrowse);
+  VLProxySuspension direct(client->m_RealTimeBrowse);
   VLHttpGet get(&client->m_RealTimeBrowse);
   VLString request = "GET /" + url.path + " HTTP/1.1\r\nHost: " + url.authority + "\r\nUser-Agent: DUDUVud\r\n\r\n";
   switch (get.Run(probeURL.c_str(), url.host.c_str(), url.port, request)) {

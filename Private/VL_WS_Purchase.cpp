@@ -46,13 +46,9 @@ extern "C" VL_WS_Status VL_WS_calcOrderTax(VL_WS_Handle* handle, int skuID, VL_W
 }
 
 extern "C" VL_WS_Status VL_WS_getBillingInfo(VL_WS_Handle* handle, VL_WS_BillingInfoResponse* info) {
-  VL_WS_Client* client = VLClientFor(handle, info);
-  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kUserData, "getBillingInfo", VLString()};
-  int soapError = VLCachedCall(*client, client->m_StreamDownloadAPI,
-                               VL_SERVICE_OPERATION(StreamDownloadAPI, getBillingInfo), &entry, VLNoFields(),
-                               VLKeptInto(VLUtilities::VL1__BillingInfoResponse2VL_WS_BillingInfoResponse, *info));
-  return VLFoldedStatus("VL_WS_getBillingInfo", soapError, info->ResponseCode, "VL_WS_getBillingInfo");
+  return VLKeptAccountRecord(handle, info, "VL_WS_getBillingInfo",
+                             VL_SERVICE_OPERATION(StreamDownloadAPI, getBillingInfo),
+                             VLUtilities::VL1__BillingInfoResponse2VL_WS_BillingInfoResponse, "VL_WS_getBillingInfo");
 }
 
 extern "C" VL_WS_Status VL_WS_getBillingInfoAndPPCBalance(VL_WS_Handle* handle, VL_WS_BillingInfoAndPPCBalance* info) {
