@@ -71,7 +71,8 @@ void ExpectTitle(const VL_WS_TitleListing& r, const VLSimTitle& t, const VLSimEp
   const std::vector<int>& skus = e ? e->products : t.products;
   EXPECT_EQ(VL_WS_TAG_PRODUCT_LISTING_ARRAY, *r.AvailableProducts.tag);
   ASSERT_EQ(static_cast<int>(skus.size()), r.AvailableProducts.Count);
-  for (size_t i = 0; i < skus.size(); ++i) ExpectProduct(r.AvailableProducts.Items[i], *Catalogue().FindProduct(skus[i]));
+  for (size_t i = 0; i < skus.size(); ++i)
+    ExpectProduct(r.AvailableProducts.Items[i], *Catalogue().FindProduct(skus[i]));
 }
 
 // The titles of a list, the first of them at position first + 1.
@@ -703,7 +704,8 @@ TEST_F(Catalog, TransportFaultOfEveryOperationLeavesAnEmptyRecordAndNothingKept)
       {"getGenreLabel", nullptr, nullptr,
        EmptyAnswer<VL_WS_GenreLabelResponse>([&](auto* r) { return VL_WS_getGenreLabel(h, 10, r); })},
       {"getTitlesByGenreArray", nullptr, nullptr,
-       EmptyAnswer<VL_WS_TitlesResponseArray>([&](auto* r) { return VL_WS_getTitlesByGenreIDs(h, 1, ids, 1, 5, 2, r); })},
+       EmptyAnswer<VL_WS_TitlesResponseArray>(
+           [&](auto* r) { return VL_WS_getTitlesByGenreIDs(h, 1, ids, 1, 5, 2, r); })},
       {"getTitleListing", "getTitleListing", "1001",
        EmptyAnswer<VL_WS_TitleListingResponse>([&](auto* r) { return VL_WS_getTitleListing(h, 1001, r); })},
       {"getTvEpisodeListing", "getTvEpisodeListing", "50001",
@@ -711,7 +713,8 @@ TEST_F(Catalog, TransportFaultOfEveryOperationLeavesAnEmptyRecordAndNothingKept)
       {"getTvEpisodeListByTitleID", "getTvEpisodeListByTitleID", "1151",
        EmptyAnswer<VL_WS_TvEpisodeListResponse>([&](auto* r) { return VL_WS_getTvEpisodeListByTitleID(h, 1151, r); })},
       {"getAllTvEpisodeListings", "getAllTvEpisodeListings", "1151",
-       EmptyAnswer<VL_WS_TitleListingResponseArray>([&](auto* r) { return VL_WS_getAllTvEpisodeListings(h, 1151, r); })},
+       EmptyAnswer<VL_WS_TitleListingResponseArray>(
+           [&](auto* r) { return VL_WS_getAllTvEpisodeListings(h, 1151, r); })},
       {"translateTivoExternalId", "translateTivoExternalId", "tivo:ts.307007",
        EmptyAnswer<VL_WS_TranslateTivoExternalIDResponse>(
            [&](auto* r) { return VL_WS_translateTivoExternalID(h, "tivo:ts.307007", r); })},
@@ -742,16 +745,19 @@ TEST_F(Catalog, TransportFaultOfEveryOperationLeavesAnEmptyRecordAndNothingKept)
                 {"soapfault:server", VL_WS_E_SOAP_FAULT(2)},
                 {"close", VL_WS_E_EOF},
                 {"malformed", VL_WS_E_HTTP_STATUS(200)}};
-  const size_t kFaults = sizeof(faults) / sizeof(faults[0]);
   Init(STREAM, 7);
-  for (size_t i = 0; i < sizeof(cases) / sizeof(cases[0]); ++i) {
-    SCOPED_TRACE(std::string(cases[i].operation) + " " + faults[i % kFaults].fault);
-    Fault(std::string(cases[i].operation) + "=" + faults[i % kFaults].fault + ",times=1");
-    EXPECT_EQ(faults[i % kFaults].status, cases[i].call());
-    if (cases[i].name != nullptr) EXPECT_FALSE(Cached(cases[i].name, cases[i].key));
+  size_t i = 0;
+  for (const auto& c : cases) {
+    const auto& f = faults[i++ % (sizeof(faults) / sizeof(faults[0]))];
+    SCOPED_TRACE(std::string(c.operation) + " " + f.fault);
+    Fault(std::string(c.operation) + "=" + f.fault + ",times=1");
+    EXPECT_EQ(f.status, c.call());
+    if (c.name != nullptr) {
+      EXPECT_FALSE(Cached(c.name, c.key));
+    }
     EXPECT_EQ(-1, Flag(1001));
     EXPECT_EQ(-1, Flag(1151));
-    EXPECT_EQ(std::vector<std::string>{cases[i].operation}, Sent(1));
+    EXPECT_EQ(std::vector<std::string>{c.operation}, Sent(1));
   }
 }
 
