@@ -29,22 +29,35 @@ std::vector<std::string> ImageFolderFiles(const std::string& folder) {
   return names;
 }
 
+// A box-art row of the cache.
+struct Row {
+  bool found = false;
+  unsigned int length = 0, needUpdate = 9;
+  std::string lastModified, data;
+};
+
 class BoxArt : public VLSimClientTest {
  protected:
-  // A handle with a cache of cacheType that stores every kind of data (file caches in m_Dir).
-  void Init(int cacheType, const char* proxyHost = nullptr, int proxyPort = 0) {
+  // A setup with a cache of cacheType that stores every kind of data (file caches in m_Dir).
+  VL_WS_SetupParams Setup(int cacheType) {
     VL_WS_SetupParams params = VLTestSetupParams();
     params.CacheType = cacheType;
     params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(cacheType ? 7 : 0);
     params.CachePath = m_Dir.path().c_str();
-    params.ProxyHost = proxyHost;
-    params.ProxyPort = proxyPort;
+    return params;
+  }
+  // Makes m_Handle anew; the request log then starts empty.
+  void Init(const VL_WS_SetupParams& params) {
+    VL_WS_release(&m_Handle);
     ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
     m_Sim.ClearRequests();
   }
-  std::string Location(VL_WS_BoxArtSize size, const char* prefix) {
+  void Init(int cacheType) { Init(Setup(cacheType)); }
+  // The answer of VL_WS_getBoxArtImage, which must have the status.
+  std::string Location(VL_WS_BoxArtSize size, const char* prefix, VL_WS_Status status = VL_WS_OK) {
     VL_WS_String location;
-    EXPECT_EQ(VL_WS_OK, VL_WS_getBoxArtImage(&m_Handle, size, prefix, &location));
+    EXPECT_EQ(status, VL_WS_getBoxArtImage(&m_Handle, size, prefix, &location));
+    EXPECT_EQ(VL_WS_TAG_STRING, *location.tag);
     std::string text = location.Text ? std::string(location.Text, location.Length) : "(null)";
     VL_WS_release(&location);
     return text;
@@ -69,13 +82,13 @@ class BoxArt : public VLSimClientTest {
       if (r.host == "images.ostrel.example") images.push_back(r);
     return images;
   }
-  bool ReadRow(const char* prefix, VL_WS_BoxArtSize size, unsigned int* length, std::string* lastModified,
-               unsigned int* needUpdate, std::string* data) {
+  Row ReadRow(const char* prefix, VL_WS_BoxArtSize size) {
+    Row row;
     VLString modified, bytes;
-    bool found = m_Handle.client->m_Cache->ReadBoxArt(prefix, size, *length, modified, *needUpdate, bytes);
-    *lastModified = modified.c_str();
-    *data = std::string(bytes.c_str(), bytes.length());
-    return found;
+    row.found = m_Handle.client->m_Cache->ReadBoxArt(prefix, size, row.length, modified, row.needUpdate, bytes);
+    row.lastModified = modified.c_str();
+    row.data = std::string(bytes.c_str(), bytes.length());
+    return row;
   }
 
   VLTestDir m_Dir;
@@ -92,13 +105,12 @@ TEST_F(BoxArt, FileCacheDownloadsOnceAndThenAnswersFromTheFile) {
   EXPECT_EQ("DUDUVud", images[0].userAgent);
   EXPECT_EQ("", images[0].ifModifiedSince);
 
-  unsigned int length = 0, needUpdate = 9;
-  std::string lastModified, data;
-  ASSERT_TRUE(ReadRow("t1001_", VL_WS_BOXART_175, &length, &lastModified, &needUpdate, &data));
-  EXPECT_EQ(VLReadFile(file).size(), length);
-  EXPECT_NE("", lastModified);
-  EXPECT_EQ(0u, needUpdate);
-  EXPECT_EQ("", data);  // the image is the file
+  Row row = ReadRow("t1001_", VL_WS_BOXART_175);
+  ASSERT_TRUE(row.found);
+  EXPECT_EQ(VLReadFile(file).size(), row.length);
+  EXPECT_NE("", row.lastModified);
+  EXPECT_EQ(0u, row.needUpdate);
+  EXPECT_EQ("", row.data);  // the image is the file
 
   EXPECT_EQ(file, Location(VL_WS_BOXART_175, "t1001_"));
   EXPECT_EQ(1u, Images(1).size());
@@ -115,20 +127,20 @@ TEST_F(BoxArt, MarkedImagesAreRevalidatedOnceWithAConditionalGet) {
   std::string file = m_Dir / "t1002_95.jpg";
   ASSERT_EQ(file, Location(VL_WS_BOXART_95, "t1002_"));
   std::string first = VLReadFile(file);
-  unsigned int length = 0, needUpdate = 0;
-  std::string lastModified, data;
-  ASSERT_TRUE(ReadRow("t1002_", VL_WS_BOXART_95, &length, &lastModified, &needUpdate, &data));
+  const Row before = ReadRow("t1002_", VL_WS_BOXART_95);
+  ASSERT_TRUE(before.found);
 
   ASSERT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
   EXPECT_EQ(file, Location(VL_WS_BOXART_95, "t1002_"));
   std::vector<VLSimRequest> images = Images(2);
   ASSERT_EQ(2u, images.size());
-  EXPECT_EQ(lastModified, images[1].ifModifiedSince);
+  EXPECT_EQ(before.lastModified, images[1].ifModifiedSince);
   EXPECT_EQ(304, images[1].status);
   EXPECT_EQ(first, VLReadFile(file));
-  ASSERT_TRUE(ReadRow("t1002_", VL_WS_BOXART_95, &length, &lastModified, &needUpdate, &data));
-  EXPECT_EQ(0u, needUpdate);
-  EXPECT_EQ(first.size(), length);
+  Row row = ReadRow("t1002_", VL_WS_BOXART_95);
+  ASSERT_TRUE(row.found);
+  EXPECT_EQ(0u, row.needUpdate);
+  EXPECT_EQ(first.size(), row.length);
   EXPECT_EQ(file, Location(VL_WS_BOXART_95, "t1002_"));
   EXPECT_EQ(2u, Images(2).size());
 
@@ -140,10 +152,10 @@ TEST_F(BoxArt, MarkedImagesAreRevalidatedOnceWithAConditionalGet) {
   EXPECT_EQ(200, Images(3)[2].status);
   EXPECT_EQ(Served("t1002_", VL_WS_BOXART_95), VLReadFile(file));
   EXPECT_NE(first, VLReadFile(file));
-  std::string newModified;
-  ASSERT_TRUE(ReadRow("t1002_", VL_WS_BOXART_95, &length, &newModified, &needUpdate, &data));
-  EXPECT_NE(lastModified, newModified);
-  EXPECT_EQ(0u, needUpdate);
+  row = ReadRow("t1002_", VL_WS_BOXART_95);
+  ASSERT_TRUE(row.found);
+  EXPECT_NE(before.lastModified, row.lastModified);
+  EXPECT_EQ(0u, row.needUpdate);
 }
 
 TEST_F(BoxArt, SizeWordsAndPrefixesReachPathAndFileName) {
@@ -165,33 +177,26 @@ TEST_F(BoxArt, WithoutAnImageTheAnswerIsItsUrlAndNothingIsLeftBehind) {
   Fault("/images/boxart/=cut,times=1");
   EXPECT_EQ("http://images.ostrel.example/images/boxart/203/t1003_203.jpg", Location(VL_WS_BOXART_203, "t1003_"));
   EXPECT_TRUE(ImageFolderFiles(m_Dir.path()).empty());
-  unsigned int length = 0, needUpdate = 0;
-  std::string lastModified, data;
-  EXPECT_FALSE(ReadRow("t1003_", VL_WS_BOXART_203, &length, &lastModified, &needUpdate, &data));
+  EXPECT_FALSE(ReadRow("t1003_", VL_WS_BOXART_203).found);
   EXPECT_EQ(m_Dir / "t1003_203.jpg", Location(VL_WS_BOXART_203, "t1003_"));
 }
 
 TEST_F(BoxArt, PrefixesWithAPathSeparatorAreNeverFiles) {
-  VLTestDir parent;
-  std::string folder = parent / "cache/";
-  VL_WS_SetupParams params = VLTestSetupParams();
-  params.CacheType = 2;
-  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+  std::string folder = m_Dir / "cache/";
+  VL_WS_SetupParams params = Setup(2);
   params.CachePath = folder.c_str();
-  ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
-  m_Sim.ClearRequests();
+  Init(params);
   EXPECT_EQ("http://images.ostrel.example/images/boxart/175/..%2Fescape_175.jpg", Location(VL_WS_BOXART_175, "../escape_"));
   std::string bytes;
   EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Data(VL_WS_BOXART_175, "../escape_", &bytes));
   EXPECT_EQ(1u, Images(1).size());
-  EXPECT_FALSE(VLFile::Exist((parent / "escape_175.jpg").c_str()));
+  EXPECT_FALSE(VLFile::Exist((m_Dir / "escape_175.jpg").c_str()));
   EXPECT_TRUE(ImageFolderFiles(folder).empty());
 }
 
 TEST_F(BoxArt, OnlyAFileCacheMakesLocalFiles) {
   for (int cacheType : {0, 1}) {
     SCOPED_TRACE(cacheType);
-    VL_WS_release(&m_Handle);
     Init(cacheType);
     EXPECT_EQ("http://images.ostrel.example/images/boxart/95/t1001_95.jpg", Location(VL_WS_BOXART_95, "t1001_"));
     EXPECT_TRUE(Images(0).empty());
@@ -203,36 +208,33 @@ TEST_F(BoxArt, MemoryCacheKeepsTheBytes) {
   std::string bytes;
   ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_177, "t1004_", &bytes));
   EXPECT_EQ(Served("t1004_", VL_WS_BOXART_177), bytes);
-  unsigned int length = 0, needUpdate = 0;
-  std::string lastModified, data;
-  ASSERT_TRUE(ReadRow("t1004_", VL_WS_BOXART_177, &length, &lastModified, &needUpdate, &data));
-  EXPECT_EQ(bytes, data);
-  EXPECT_EQ(bytes.size(), length);
+  const Row row = ReadRow("t1004_", VL_WS_BOXART_177);
+  ASSERT_TRUE(row.found);
+  EXPECT_EQ(bytes, row.data);
+  EXPECT_EQ(bytes.size(), row.length);
 
   ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_177, "t1004_", &bytes));
-  EXPECT_EQ(data, bytes);
+  EXPECT_EQ(row.data, bytes);
   EXPECT_EQ(1u, Images(1).size());
 
   // Revalidation: 304 keeps the stored bytes, a new picture replaces them.
   ASSERT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
   ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_177, "t1004_", &bytes));
-  EXPECT_EQ(data, bytes);
+  EXPECT_EQ(row.data, bytes);
   ASSERT_EQ(2u, Images(2).size());
   EXPECT_EQ(304, Images(2)[1].status);
   m_Sim.Store().TouchBoxArt("t1004_");
   ASSERT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
   ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_177, "t1004_", &bytes));
   EXPECT_EQ(Served("t1004_", VL_WS_BOXART_177), bytes);
-  EXPECT_NE(data, bytes);
-  ASSERT_TRUE(ReadRow("t1004_", VL_WS_BOXART_177, &length, &lastModified, &needUpdate, &data));
-  EXPECT_EQ(bytes, data);
+  EXPECT_NE(row.data, bytes);
+  EXPECT_EQ(bytes, ReadRow("t1004_", VL_WS_BOXART_177).data);
   EXPECT_EQ(3u, Images(3).size());
 }
 
 TEST_F(BoxArt, ImageDataComesFromTheFileCacheOrEveryTimeFromTheHost) {
   for (int cacheType : {2, 0}) {
     SCOPED_TRACE(cacheType);
-    VL_WS_release(&m_Handle);
     Init(cacheType);
     std::string first, second;
     ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_269, "t1005_", &first));
@@ -244,7 +246,6 @@ TEST_F(BoxArt, ImageDataComesFromTheFileCacheOrEveryTimeFromTheHost) {
   }
   // The same image through both operations: one file.
   EXPECT_EQ(Served("t1005_", VL_WS_BOXART_269), VLReadFile(m_Dir / "t1005_269.jpg"));
-  VL_WS_release(&m_Handle);
   Init(2);
   EXPECT_EQ(m_Dir / "t1005_269.jpg", Location(VL_WS_BOXART_269, "t1005_"));
   EXPECT_TRUE(Images(0).empty());
@@ -256,8 +257,10 @@ TEST_F(BoxArt, ImageDataComesFromTheFileCacheOrEveryTimeFromTheHost) {
 
 TEST_F(BoxArt, ImagesBypassTheProxy) {
   // A proxy that is not there: SOAP calls fail, images still come.
-  std::string proxy = "127.0.0.1";
-  Init(1, proxy.c_str(), VLClosedPort());
+  VL_WS_SetupParams params = Setup(1);
+  params.ProxyHost = "127.0.0.1";
+  params.ProxyPort = VLClosedPort();
+  Init(params);
   std::string bytes;
   EXPECT_EQ(VL_WS_OK, Data(VL_WS_BOXART_65, "t1007_", &bytes));
   EXPECT_EQ(Served("t1007_", VL_WS_BOXART_65), bytes);
@@ -269,26 +272,20 @@ TEST_F(BoxArt, ImagesBypassTheProxy) {
 
 TEST_F(BoxArt, RequestsNamingNoImageAreRefused) {
   Init(2);
-  VL_WS_String location;
+  EXPECT_EQ("(null)", Location(VL_WS_BOXART_95, "", VL_WS_E_INVALID_ARGUMENT));
+  EXPECT_EQ("(null)", Location(VL_WS_BOXART_95, nullptr, VL_WS_E_INVALID_ARGUMENT));
+  EXPECT_EQ("(null)", Location(static_cast<VL_WS_BoxArtSize>(13), "t1001_", VL_WS_E_INVALID_ARGUMENT));
   VL_WS_Image image;
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(&m_Handle, VL_WS_BOXART_95, "", &location));
-  EXPECT_EQ(VL_WS_TAG_STRING, *location.tag);
-  VL_WS_release(&location);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(&m_Handle, VL_WS_BOXART_95, nullptr, &location));
-  VL_WS_release(&location);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT,
-            VL_WS_getBoxArtImage(&m_Handle, static_cast<VL_WS_BoxArtSize>(13), "t1001_", &location));
-  VL_WS_release(&location);
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImageData(&m_Handle, VL_WS_BOXART_95, "", &image));
   EXPECT_EQ(VL_WS_TAG_IMAGE, *image.tag);
   EXPECT_EQ(nullptr, image.Data);
   VL_WS_release(&image);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT,
-            VL_WS_getBoxArtImageData(&m_Handle, static_cast<VL_WS_BoxArtSize>(-1), "t1001_", &image));
-  VL_WS_release(&image);
+  std::string bytes;
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Data(static_cast<VL_WS_BoxArtSize>(-1), "t1001_", &bytes));
   VL_WS_Handle empty = {};
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImageData(&empty, VL_WS_BOXART_95, "t1001_", &image));
   VL_WS_release(&image);
+  VL_WS_String location;
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(nullptr, VL_WS_BOXART_95, "t1001_", &location));
   VL_WS_release(&location);
   EXPECT_TRUE(Images(0).empty());

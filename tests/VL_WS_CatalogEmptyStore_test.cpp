@@ -5,7 +5,6 @@
 #include <stdlib.h>
 
 #include <fstream>
-#include <memory>
 #include <string>
 
 #include "CacheInterface.h"
@@ -29,56 +28,35 @@ void WriteEmptyStore(const std::string& folder) {
   }
 }
 
-class EmptyStore : public testing::Test {
- protected:
-  static void SetUpTestSuite() {
-    s_Data = new VLTestDir;
-    WriteEmptyStore(s_Data->path());
-    VLSimOptions options;
-    options.dataFolder = s_Data->path();
-    s_Sim = new VLSimServer(options);
-    std::string error;
-    ASSERT_TRUE(s_Sim->Start(&error)) << error;
-    setenv("SSL_CERT_FILE", s_Sim->CAFile().c_str(), 1);
-    setenv("VLWS_CONNECT_TO", s_Sim->ConnectTo().c_str(), 1);
-  }
-  static void TearDownTestSuite() {
-    delete s_Sim;
-    delete s_Data;
-  }
-  void SetUp() override {
-    VL_WS_SetupParams params = VLTestSetupParams();
-    params.CacheType = 1;
-    params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
-    ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
-  }
-  void TearDown() override { VL_WS_release(&m_Handle); }
+TEST(EmptyStore, EmptyGenreTreeIsReturnedAndAskedForEveryTime) {
+  VLTestDir data;
+  WriteEmptyStore(data.path());
+  VLSimOptions options;
+  options.dataFolder = data.path();
+  VLSimServer sim(options);
+  std::string error;
+  ASSERT_TRUE(sim.Start(&error)) << error;
+  setenv("SSL_CERT_FILE", sim.CAFile().c_str(), 1);
+  setenv("VLWS_CONNECT_TO", sim.ConnectTo().c_str(), 1);
 
-  bool Cached(const char* name, const char* key) {
-    VLString value;
-    return m_Handle.client->m_Cache->ReadMetaData(name, key, value);
-  }
-
-  static VLTestDir* s_Data;
-  static VLSimServer* s_Sim;
-  VL_WS_Handle m_Handle = {};
-};
-
-VLTestDir* EmptyStore::s_Data = nullptr;
-VLSimServer* EmptyStore::s_Sim = nullptr;
-
-TEST_F(EmptyStore, EmptyGenreTreeIsReturnedAndAskedForEveryTime) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  params.CacheType = 1;
+  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+  VL_WS_Handle handle = {};
+  ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&handle, &params));
   for (int round = 0; round < 2; ++round) {
     VL_WS_GenreArray genres;
-    ASSERT_EQ(VL_WS_OK, VL_WS_getNavigation(&m_Handle, &genres));
+    ASSERT_EQ(VL_WS_OK, VL_WS_getNavigation(&handle, &genres));
     EXPECT_EQ(VL_WS_TAG_GENRE_ARRAY, *genres.tag);
     EXPECT_EQ(0, genres.Count);
     EXPECT_EQ(nullptr, genres.Items);
     EXPECT_EQ(VL_WS_OK, VL_WS_release(&genres));
-    EXPECT_FALSE(Cached("getNavigation", ""));
+    VLString value;
+    EXPECT_FALSE(handle.client->m_Cache->ReadMetaData("getNavigation", "", value));
   }
-  ASSERT_TRUE(s_Sim->WaitForRequests(3, 5000));  // the load time and both trees
-  EXPECT_EQ(3u, s_Sim->Requests().size());
+  ASSERT_TRUE(sim.WaitForRequests(3, 5000));  // the load time and both trees
+  EXPECT_EQ(3u, sim.Requests().size());
+  VL_WS_release(&handle);
 }
 
 }  // namespace
