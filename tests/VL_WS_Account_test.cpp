@@ -63,8 +63,7 @@ TEST_F(Account, AuthorisationReplacesTheTokenAndPurgesUserData) {
   EXPECT_EQ(old, requests[0].authToken);
   EXPECT_EQ("GetCountryID", requests[1].operation);
   EXPECT_EQ(answer->AuthToken, requests[1].authToken);
-  EXPECT_EQ((Lines{"VL_WS_authorizeDevice, ret:0,responseCode:0", "VL_WS_getCountryID, ret:0,countryid:1"}),
-            TakeLog());
+  EXPECT_EQ((Lines{"VL_WS_authorizeDevice, ret:0,responseCode:0", "VL_WS_getCountryID, ret:0,countryid:1"}), TakeLog());
 }
 
 TEST_F(Account, DeactivationEmptiesTheToken) {
@@ -100,9 +99,9 @@ TEST_F(Account, TokenCheckPurgesUserDataWhenTheAnswerChanges) {
   EXPECT_FALSE(valid);
   EXPECT_FALSE(Settings().AuthTokenValid);
   EXPECT_FALSE(UserDataKept());
-  EXPECT_EQ((Lines{"VL_WS_checkAuthToken, result:1", "VL_WS_checkAuthToken, result:1",
-                   "VL_WS_checkAuthToken, result:0"}),
-            TakeLog());
+  EXPECT_EQ(
+      (Lines{"VL_WS_checkAuthToken, result:1", "VL_WS_checkAuthToken, result:1", "VL_WS_checkAuthToken, result:0"}),
+      TakeLog());
 
   // A failed check changes nothing.
   MarkUserData();
