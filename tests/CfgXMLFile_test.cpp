@@ -75,6 +75,7 @@ TEST(CfgXMLFile, WritesKeepOrderAndReplaceInPlace) {
   EXPECT_LT(a, b);
   EXPECT_LT(b, lower);
   EXPECT_NE(std::string::npos, text.find("second &lt;&amp;&gt;")) << text;
+  EXPECT_EQ(text.find("Key=\"A\""), text.rfind("Key=\"A\""));  // one setting A
   EXPECT_EQ(std::string::npos, text.find("first"));
 
   EXPECT_READ(path, "A", false, CFG_OK, "Gr\xC3\xBC\xC3\x9F" "e");
