@@ -4,6 +4,7 @@
 #include <gtest/gtest.h>
 #include <stdlib.h>
 
+#include <algorithm>
 #include <regex>
 #include <string>
 #include <vector>
@@ -70,16 +71,10 @@ class CfgMovie : public testing::Test {
     Run("var answer = JSON.stringify(" + expression + ");");
     return m_Stage.Global().GetProperty("answer").AsString().CString();
   }
-  // Whether a log line equals line ("<level>:<text>", the text without its line end).
-  bool Logged(const std::string& line) const {
-    for (const std::string& l : m_Log)
-      if (l == line) return true;
-    return false;
-  }
+  // Whether a log line equals line ("<level>:<text>", the text without its line end), or holds text.
+  bool Logged(const std::string& line) const { return std::find(m_Log.begin(), m_Log.end(), line) != m_Log.end(); }
   bool LogMentions(const std::string& text) const {
-    for (const std::string& l : m_Log)
-      if (l.find(text) != std::string::npos) return true;
-    return false;
+    return std::any_of(m_Log.begin(), m_Log.end(), [&](const std::string& l) { return l.find(text) != l.npos; });
   }
   std::string Path(const std::string& name) const { return m_Dir / name; }
 
@@ -152,8 +147,8 @@ class CfgUpgrade : public CfgMovie {
  protected:
   // New files: a settings file of XMLVersion settingsVersion with a token, an identifier and a
   // preference, and a configuration file of XMLVersion configVersion (each version left out
-  // when empty).
-  void Prepare(const char* settingsVersion, const char* configVersion) {
+  // when empty); then the extension's init.
+  void InitWith(const char* settingsVersion, const char* configVersion) {
     VL_WS_removeFile(Path("ffpreference.xml").c_str());
     VL_WS_removeFile(Path("ffcredentials.xml").c_str());
     if (*settingsVersion) Put(Path("ffpreference.xml"), "XMLVersion", settingsVersion);
@@ -163,72 +158,60 @@ class CfgUpgrade : public CfgMovie {
     if (*configVersion) Put(Path("ffcredentials.xml"), "XMLVersion", configVersion);
     Put(Path("ffcredentials.xml"), "Server", "production");
     m_Before = VLReadFile(Path("ffpreference.xml"));
+    m_Log.clear();
+    ASSERT_EQ("true", Eval("cfg.init('VLTEST_CFG', 'VLTEST_PREF')"));
   }
-  void Init() { ASSERT_EQ("true", Eval("cfg.init('VLTEST_CFG', 'VLTEST_PREF')")); }
   bool Unchanged() const { return VLReadFile(Path("ffpreference.xml")) == m_Before; }
-  void ExpectRebuiltWith(const char* version) {
-    std::string file = Path("ffpreference.xml");
-    EXPECT_EQ(3u, SettingCount(file));
-    EXPECT_EQ(version, Setting(file, "XMLVersion"));
-    EXPECT_EQ("token-4711", Setting(file, "AuthToken", true));
-    EXPECT_EQ("00-11-22-33-44-55", Setting(file, "DestinationUniqueID"));
-    EXPECT_EQ("<-1906>", Setting(file, "Volume"));
-    EXPECT_TRUE(LogMentions("VLCfgLibAE::checkXMLupgrade Updated SettingsFile(Only keep AuthToken, "
-                            "DestinationUniqueID and added a new tag XMLVersion)."));
-    EXPECT_FALSE(VLFile::Exist((file + ".upgrade").c_str()));
-  }
 
   std::string m_Before;
 };
 
-TEST_F(CfgUpgrade, ANewerConfigurationVersionKeepsExactlyTheThreeKeys) {
-  Prepare("1.2", "1.3");
-  Init();
-  ExpectRebuiltWith("1.3");
-  EXPECT_TRUE(Logged("4:Entering VLCfgLibAE::checkXMLupgrade"));
-}
-
-TEST_F(CfgUpgrade, ASettingsFileWithoutVersionIsUpgraded) {
-  Prepare("", "1.0");
-  Init();
-  ExpectRebuiltWith("1.0");
+TEST_F(CfgUpgrade, ANewerOrAFirstConfigurationVersionKeepsExactlyTheThreeKeys) {
+  const char* cases[][2] = {{"1.2", "1.3"}, {"", "1.0"}};  // settings version, configuration version
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c[0]);
+    InitWith(c[0], c[1]);
+    std::string file = Path("ffpreference.xml");
+    EXPECT_EQ(3u, SettingCount(file));
+    EXPECT_EQ(c[1], Setting(file, "XMLVersion"));
+    EXPECT_EQ("token-4711", Setting(file, "AuthToken", true));
+    EXPECT_EQ("00-11-22-33-44-55", Setting(file, "DestinationUniqueID"));
+    EXPECT_EQ("<-1906>", Setting(file, "Volume"));
+    EXPECT_TRUE(Logged("4:Entering VLCfgLibAE::checkXMLupgrade"));
+    EXPECT_TRUE(
+        LogMentions("VLCfgLibAE::checkXMLupgrade Updated SettingsFile(Only keep AuthToken, "
+                    "DestinationUniqueID and added a new tag XMLVersion)."));
+    EXPECT_FALSE(VLFile::Exist((file + ".upgrade").c_str()));
+  }
 }
 
 TEST_F(CfgUpgrade, AFirstStartGetsAVersionAndANewIdentifier) {
   Put(Path("ffcredentials.xml"), "XMLVersion", "2.0");
-  Init();
+  EXPECT_EQ("true", Eval("cfg.init('VLTEST_CFG', 'VLTEST_PREF')"));
   std::string file = Path("ffpreference.xml");
   EXPECT_EQ(2u, SettingCount(file));
   EXPECT_EQ("2.0", Setting(file, "XMLVersion"));
   EXPECT_TRUE(std::regex_match(Setting(file, "DestinationUniqueID"), std::regex(kIdPattern)));
 }
 
-TEST_F(CfgUpgrade, EqualOlderOrMissingConfigurationVersionsChangeNothing) {
-  const char* cases[][2] = {{"1.3", "1.3"}, {"1.4", "1.3"}, {"1.9", "1.10"}, {"1.3", ""}};
+TEST_F(CfgUpgrade, EqualOlderMissingOrInvalidVersionsChangeNothing) {
+  // settings version, configuration version, the one logged as invalid (if any)
+  const char* cases[][3] = {{"1.3", "1.3", nullptr}, {"1.4", "1.3", nullptr}, {"1.9", "1.10", nullptr},
+                            {"1.3", "", nullptr},    {"1.2", "1..3", "1..3"}, {"1..2", "1.3", "1..2"},
+                            {"1.2", "1.3a", "1.3a"}, {"v1", "1.3", "v1"}};
   for (const auto& c : cases) {
-    Prepare(c[0], c[1]);
-    Init();
+    InitWith(c[0], c[1]);
     EXPECT_TRUE(Unchanged()) << c[0] << " / " << c[1];
-  }
-}
-
-TEST_F(CfgUpgrade, AnInvalidVersionInEitherFileChangesNothing) {
-  // settings version, configuration version, the one logged as invalid
-  const char* cases[][3] = {{"1.2", "1..3", "1..3"}, {"1..2", "1.3", "1..2"}, {"1.2", "1.3a", "1.3a"},
-                            {"v1", "1.3", "v1"}};
-  for (const auto& c : cases) {
-    Prepare(c[0], c[1]);
-    Init();
-    EXPECT_TRUE(Unchanged()) << c[0] << " / " << c[1];
-    EXPECT_TRUE(Logged(std::string("4:VLCfgLibAE checkXMLupgrade  XMLVersion is invalid value. (") + c[2] + ")"));
+    if (c[2] != nullptr) {
+      EXPECT_TRUE(Logged(std::string("4:VLCfgLibAE checkXMLupgrade  XMLVersion is invalid value. (") + c[2] + ")"));
+    }
   }
 }
 
 TEST_F(CfgUpgrade, AFailedRebuildLeavesTheOldFile) {
-  Prepare("1.2", "1.3");
   // The new file cannot take the old one's place: a folder stands where it is built.
   ASSERT_EQ(VL_WS_OK, VL_WS_createFolder(Path("ffpreference.xml.upgrade/busy").c_str()));
-  Init();
+  InitWith("1.2", "1.3");
   EXPECT_TRUE(Unchanged());
   EXPECT_EQ("token-4711", Setting(Path("ffpreference.xml"), "AuthToken", true));
 }
@@ -248,8 +231,8 @@ TEST_F(CfgMovie, SelectEnvSwitchesAmongTheEnvironmentFiles) {
   EXPECT_TRUE(Logged("4:VLCfgLibAE::selectEnv m_SettingsFile = ./ffpreference.xml"));
   EXPECT_EQ("\"\"", Eval("cfg.read('Volume', false)"));
 
-  for (const char* bad : {"cfg.selectEnv(4)", "cfg.selectEnv(-1)", "cfg.selectEnv('x')", "cfg.selectEnv()",
-                          "cfg.selectEnv(1, 2)"})
+  for (const char* bad :
+       {"cfg.selectEnv(4)", "cfg.selectEnv(-1)", "cfg.selectEnv('x')", "cfg.selectEnv()", "cfg.selectEnv(1, 2)"})
     EXPECT_EQ("false", Eval(bad)) << bad;
   EXPECT_TRUE(LogMentions("There is no environment 4"));
 }
@@ -311,10 +294,9 @@ TEST_F(CfgMovie, SetFileWantsTwoOrFourArguments) {
 }
 
 TEST_F(CfgMovie, WrongArgumentCountsGiveTheInitialResults) {
-  EXPECT_EQ("false", Eval("cfg.init('VLTEST_CFG')"));
+  for (const char* call : {"cfg.init('VLTEST_CFG')", "cfg.write('Volume', '1')", "cfg.clearEnv()"})
+    EXPECT_EQ("false", Eval(call)) << call;
   EXPECT_EQ("\"\"", Eval("cfg.read('Volume')"));
-  EXPECT_EQ("false", Eval("cfg.write('Volume', '1')"));
-  EXPECT_EQ("false", Eval("cfg.clearEnv()"));
 }
 
 class CfgMigration : public CfgMovie {
@@ -345,8 +327,8 @@ TEST_F(CfgMigration, TheOldSettingsMoveToTheOldReleasesFolder) {
   EXPECT_TRUE(Logged("4:VLCfgLibAE::setFile BCSettingsFile(" + m_BC + ") existed."));
   EXPECT_TRUE(Logged("4:VLCfgLibAE::setFile USSettingsFile(" + m_US + ") doesn't exist."));
   EXPECT_TRUE(Logged("4:VLCfgLibAE::setFile Successfully create USSettingsFile folder(" + Path("app/1_00/") + ")."));
-  EXPECT_TRUE(Logged("4:VLCfgLibAE::setFile Successfully copy BCSettingsFile(" + m_BC + ") to USSettingsFile(" +
-                     m_US + ")."));
+  EXPECT_TRUE(
+      Logged("4:VLCfgLibAE::setFile Successfully copy BCSettingsFile(" + m_BC + ") to USSettingsFile(" + m_US + ")."));
   EXPECT_TRUE(Logged("4:VLCfgLibAE::setFile Successfully remove BCSettingsFile(" + m_BC + ")."));
   EXPECT_TRUE(Logged("4:VLCfgLibAE::setFile Successfully clear BCCachePath(" + m_Cache + ")."));
   // Nothing is left to migrate the next time.

@@ -140,9 +140,9 @@ TEST(HttpURL, SplitsHostPortAndPath) {
   EXPECT_STREQ("127.0.0.1:8080", parts.authority.c_str());
   EXPECT_STREQ("127.0.0.1", parts.host.c_str());
   EXPECT_EQ(8080, parts.port);
-  for (const char* bad : {"http://host", "http://host/", "images.ostrel.example/probe", "http:///probe",
-                          "http://:80/probe", "http://host:/p", "http://host:0/p", "http://host:65536/p",
-                          "http://host:8o/p"})
+  for (const char* bad :
+       {"http://host", "http://host/", "images.ostrel.example/probe", "http:///probe", "http://:80/probe",
+        "http://host:/p", "http://host:0/p", "http://host:65536/p", "http://host:8o/p"})
     EXPECT_FALSE(VLHttpGet::SplitURL(bad, &parts)) << bad;
 }
 
@@ -210,13 +210,10 @@ TEST_F(Bandwidth, AnAnnouncedMegabyteIsMeasuredOverItsFirst204800Bytes) {
 
   EXPECT_EQ(VL_WS_E_NETWORK, Check(Canned(Answer(1000000, 204799)), &bits));
   EXPECT_EQ(0u, bits);
-}
 
-TEST_F(Bandwidth, ABodyThatCameWithTheHeaderCountsAsTimedInAtLeastOneMillisecond) {
-  Init();
-  unsigned int bits = 0;
+  // A body that came with the header counts as timed in at least one millisecond.
   ASSERT_EQ(VL_WS_OK, Check(Canned(Answer(100, 100)), &bits));
-  EXPECT_LE(bits, 800000u);  // 100 bytes in 1 millisecond at most
+  EXPECT_LE(bits, 800000u);
   EXPECT_GE(bits, 8000u);
 }
 
@@ -262,7 +259,7 @@ TEST_F(Bandwidth, TheProbeBypassesTheHandlesProxyAndRestoresIt) {
   EXPECT_EQ(proxy, m_Handle.client->m_RealTimeBrowse.proxy_host);
 }
 
-TEST_F(Bandwidth, TheProbeURLComesFromTheStoresConfigurationOnce) {
+TEST_F(Bandwidth, TheProbeURLComesFromTheStoresConfigurationOnceAndPointsAtTheImageHost) {
   Init();
   unsigned int bits = 0;
   ASSERT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
@@ -272,12 +269,17 @@ TEST_F(Bandwidth, TheProbeURLComesFromTheStoresConfigurationOnce) {
   ASSERT_EQ(2u, requests.size());
   EXPECT_EQ("getConfig", requests[0].operation);
   EXPECT_EQ("bandwidth probe", requests[1].note);
+  EXPECT_EQ("images.ostrel.example", requests[1].host);
+  EXPECT_EQ("/speedtest/probe.bin", requests[1].path);
+  EXPECT_EQ("DUDUVud", requests[1].userAgent);
 
   m_Sim.ClearRequests();
   ASSERT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
   requests = Requests(1);
   ASSERT_EQ(1u, requests.size());
   EXPECT_EQ("bandwidth probe", requests[0].note);
+  Fault("/speedtest/=status:404,times=1");
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, VL_WS_checkBandwidth(&m_Handle, &bits));
 }
 
 TEST_F(Bandwidth, TheLastProbeKeyInAnyLetterCaseWins) {
@@ -301,29 +303,12 @@ TEST_F(Bandwidth, AConfigurationWithoutProbeOrNoConfigurationAtAll) {
   EXPECT_STREQ("", m_Handle.client->m_Params.BandwithCheckURL.c_str());
 }
 
-TEST_F(Bandwidth, TheStoresProbeOnTheImageHost) {
-  Init();
-  unsigned int bits = 0;
-  ASSERT_EQ(VL_WS_OK, Check(kStoreProbe, &bits));
-  EXPECT_GT(bits, 0u);
-  VLSimRequest probe = Requests(1).back();
-  EXPECT_EQ("images.ostrel.example", probe.host);
-  EXPECT_EQ("/speedtest/probe.bin", probe.path);
-  EXPECT_EQ("DUDUVud", probe.userAgent);
-  EXPECT_EQ("bandwidth probe", probe.note);
-  Fault("/speedtest/=status:404,times=1");
-  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Check(kStoreProbe, &bits));
-}
-
-// Times of the store's clock, as seconds since 1970 UTC.
+// A time of the store's clock, as seconds since 1970 UTC: 2010-12-31 11:59:59 PM.
 const time_t k20101231_235959 = 1293839999;
-const time_t k20110101_000500 = 1293840300;
-const time_t k20110615_123000 = 1308141000;
-const time_t k20110615_010203 = 1308099723;
 
 TEST_F(Device, ServerTimeReadsTheStoresTwelveHourClock) {
-  // 11:59:59 PM, 12:05:00 AM, 12:30:00 PM and 1:02:03 AM
-  for (time_t now : {k20101231_235959, k20110101_000500, k20110615_123000, k20110615_010203}) {
+  // 11:59:59 PM, 2011-01-01 12:05:00 AM, 2011-06-15 12:30:00 PM and 1:02:03 AM
+  for (time_t now : {k20101231_235959, time_t{1293840300}, time_t{1308141000}, time_t{1308099723}}) {
     m_Sim.Store().SetNow(now);
     time_t got = 0;
     EXPECT_EQ(VL_WS_OK, VL_WS_getServerTime(&got));

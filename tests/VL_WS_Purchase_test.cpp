@@ -10,6 +10,11 @@
 
 namespace {
 
+using Lines = std::vector<std::string>;
+// Response codes of the store and the statuses they give.
+using Codes = std::vector<std::pair<int, VL_WS_Status>>;
+const VL_WS_Status kOther = VL_WS_E_UNEXPECTED;  // a code without a row of its own
+
 const char kIPAddress[] = "192.0.2.17";
 const int kRentalSku = 10021;  // title 1002, rented for 48 hours, 2.99
 const int kBuySku = 10012;     // title 1001, 19.99
@@ -18,13 +23,15 @@ class Purchase : public VLTestAccountClient {
  protected:
   void SetUp() override {
     VLTestAccountClient::SetUp();
-    m_Sim.Store().RemoveAllPurchases(Account(), "alicepw");
-    m_Sim.Store().SetPrepaidCents(Account(), 2500);
+    ResetAccount();
   }
   void TearDown() override {
+    ResetAccount();
+    VLTestAccountClient::TearDown();
+  }
+  void ResetAccount() {
     m_Sim.Store().RemoveAllPurchases(Account(), "alicepw");
     m_Sim.Store().SetPrepaidCents(Account(), 2500);
-    VLTestAccountClient::TearDown();
   }
 
   int PrepaidCents() {
@@ -32,24 +39,21 @@ class Purchase : public VLTestAccountClient {
     m_Sim.Store().Account(Account(), &data);
     return data.prepaidCents;
   }
-  // Buys sku with the saved card; the new pass.
-  int Buy(int sku) {
-    VL_WS_PurchaseResponse answer;
-    EXPECT_EQ(VL_WS_OK, VL_WS_doPurchaseSavedBilling(&m_Handle, sku, kIPAddress, false, &answer));
-    int pass = answer.PassID;
-    VL_WS_release(&answer);
-    return pass;
+  // Buys sku with the saved card or the prepaid funds; the new pass.
+  int Buy(int sku, bool prepaid = false) {
+    VLAnswer<VL_WS_PurchaseResponse> answer;
+    EXPECT_EQ(VL_WS_OK, VL_WS_doPurchaseSavedBilling(&m_Handle, sku, kIPAddress, prepaid, answer.Fresh()));
+    return answer->PassID;
   }
 };
 
 TEST_F(Purchase, MissingIPAddressIsRefusedBeforeAnyRequest) {
   Init();
   for (const char* ip : {static_cast<const char*>(nullptr), ""}) {
-    VL_WS_PurchaseResponse answer;
-    EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_doPurchaseSavedBilling(&m_Handle, kBuySku, ip, false, &answer));
-    EXPECT_EQ(VL_WS_TAG_PURCHASE_RESPONSE, *answer.tag);
-    EXPECT_EQ(nullptr, answer.ResponseMessage);
-    VL_WS_release(&answer);
+    VLAnswer<VL_WS_PurchaseResponse> answer;
+    EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_doPurchaseSavedBilling(&m_Handle, kBuySku, ip, false, answer.Fresh()));
+    EXPECT_EQ(VL_WS_TAG_PURCHASE_RESPONSE, *answer->tag);
+    EXPECT_EQ(nullptr, answer->ResponseMessage);
   }
   EXPECT_TRUE(RequestsNow().empty());
   EXPECT_TRUE(TakeLog().empty());
@@ -61,77 +65,57 @@ TEST_F(Purchase, PurchaseDropsTheCachedWishlist) {
   ASSERT_TRUE(Cache().WriteUserData("getEmailAddress", "", "an e-mail answer"));
   ASSERT_TRUE(Cache().WriteWishlistFlag(1001, true));
 
-  VL_WS_PurchaseResponse answer;
-  ASSERT_EQ(VL_WS_OK, VL_WS_doPurchaseSavedBilling(&m_Handle, kBuySku, kIPAddress, false, &answer));
-  EXPECT_LT(0, answer.PassID);
-  EXPECT_LT(0, answer.TransactionId);
-  EXPECT_STRNE("", answer.TransactionAuthNum);
+  VLAnswer<VL_WS_PurchaseResponse> answer;
+  ASSERT_EQ(VL_WS_OK, VL_WS_doPurchaseSavedBilling(&m_Handle, kBuySku, kIPAddress, false, answer.Fresh()));
+  EXPECT_LT(0, answer->PassID);
+  EXPECT_LT(0, answer->TransactionId);
+  EXPECT_STRNE("", answer->TransactionAuthNum);
   EXPECT_EQ(2500, PrepaidCents());  // "no": the saved card paid
-  VL_WS_release(&answer);
 
   VLString value;
   bool flag = false;
   EXPECT_FALSE(Cache().ReadUserData("getWishlistItems", "0,1,10,0", value));
   EXPECT_FALSE(Cache().ReadWishlistFlag(1001, flag));
   EXPECT_TRUE(Cache().ReadUserData("getEmailAddress", "", value));
-  EXPECT_EQ(std::vector<std::string>{"VL_WS_doPurchaseSavedBilling, ret:0,responseCode:0"}, TakeLog());
+  EXPECT_EQ(Lines{"VL_WS_doPurchaseSavedBilling, ret:0,responseCode:0"}, TakeLog());
 
-  // "yes": the prepaid funds pay.
-  ASSERT_EQ(VL_WS_OK, VL_WS_doPurchaseSavedBilling(&m_Handle, kRentalSku, kIPAddress, true, &answer));
+  Buy(kRentalSku, true);  // "yes": the prepaid funds pay
   EXPECT_EQ(2500 - 299, PrepaidCents());
-  VL_WS_release(&answer);
 }
 
 TEST_F(Purchase, RefusedPurchasesHaveTheirOwnStatuses) {
   Init(STREAM, 7);
   Buy(kBuySku);
   ASSERT_TRUE(Cache().WriteWishlistFlag(1001, true));
-  VL_WS_PurchaseResponse answer;
-  EXPECT_EQ(VL_WS_E_PURCHASE_3, VL_WS_doPurchaseSavedBilling(&m_Handle, kBuySku, kIPAddress, false, &answer));
-  EXPECT_EQ(3, answer.ResponseCode);
-  EXPECT_STREQ("The title is already owned", answer.ResponseMessage);
-  VL_WS_release(&answer);
-  bool flag = false;
-  EXPECT_TRUE(Cache().ReadWishlistFlag(1001, flag));  // a refusal changes nothing
+  VLAnswer<VL_WS_PurchaseResponse> answer;
+  EXPECT_EQ(VL_WS_E_PURCHASE_3, VL_WS_doPurchaseSavedBilling(&m_Handle, kBuySku, kIPAddress, false, answer.Fresh()));
+  EXPECT_EQ(3, answer->ResponseCode);
+  EXPECT_STREQ("The title is already owned", answer->ResponseMessage);
 
-  const std::vector<std::pair<int, VL_WS_Status>> codes = {{1, -1007},
-                                                           {2, -1008},
-                                                           {5, -1011},
-                                                           {11, -1017},
-                                                           {12, -1018},
-                                                           {13, VL_WS_E_UNEXPECTED},
-                                                           {19, VL_WS_E_UNEXPECTED},
-                                                           {20, -1028},
-                                                           {21, -1021},
-                                                           {22, -1022},
-                                                           {23, VL_WS_E_UNEXPECTED}};
+  const Codes codes = {{1, -1007},   {2, -1008},  {5, -1011},  {11, -1017}, {12, -1018}, {13, kOther},
+                       {19, kOther}, {20, -1028}, {21, -1021}, {22, -1022}, {23, kOther}};
   for (const auto& c : codes) {
     SCOPED_TRACE(c.first);
     Fault("doPurchaseSavedbilling=code:" + std::to_string(c.first) + ",times=1");
-    EXPECT_EQ(c.second, VL_WS_doPurchaseSavedBilling(&m_Handle, kRentalSku, kIPAddress, false, &answer));
-    EXPECT_EQ(c.first, answer.ResponseCode);
-    VL_WS_release(&answer);
+    EXPECT_EQ(c.second, VL_WS_doPurchaseSavedBilling(&m_Handle, kRentalSku, kIPAddress, false, answer.Fresh()));
+    EXPECT_EQ(c.first, answer->ResponseCode);
   }
-  EXPECT_TRUE(Cache().ReadWishlistFlag(1001, flag));
+  bool flag = false;
+  EXPECT_TRUE(Cache().ReadWishlistFlag(1001, flag));  // a refusal changes nothing
 }
 
 TEST_F(Purchase, TaxOfAnOrder) {
   Init();
-  VL_WS_OrderTaxResponse tax;
-  ASSERT_EQ(VL_WS_OK, VL_WS_calcOrderTax(&m_Handle, kBuySku, &tax));
-  EXPECT_STREQ("19.99", tax.SubTotal);
-  EXPECT_STRNE("", tax.Tax);
-  EXPECT_STRNE("", tax.TotalPrice);
-  VL_WS_release(&tax);
-
-  const std::vector<std::pair<int, VL_WS_Status>> codes = {
-      {1, -1023},  {2, -1024},  {3, -1025},  {4, VL_WS_E_UNEXPECTED},
-      {11, -1026}, {12, -1027}, {20, -1028}, {21, VL_WS_E_UNEXPECTED}};
+  VLAnswer<VL_WS_OrderTaxResponse> tax;
+  ASSERT_EQ(VL_WS_OK, VL_WS_calcOrderTax(&m_Handle, kBuySku, tax.Fresh()));
+  EXPECT_STREQ("19.99", tax->SubTotal);
+  EXPECT_STRNE("", tax->Tax);
+  EXPECT_STRNE("", tax->TotalPrice);
+  const Codes codes = {{1, -1023},  {2, -1024},  {3, -1025},  {4, kOther},
+                       {11, -1026}, {12, -1027}, {20, -1028}, {21, kOther}};
   for (const auto& c : codes) {
-    SCOPED_TRACE(c.first);
     Fault("calcOrderTax=code:" + std::to_string(c.first) + ",times=1");
-    EXPECT_EQ(c.second, VL_WS_calcOrderTax(&m_Handle, kBuySku, &tax));
-    VL_WS_release(&tax);
+    EXPECT_EQ(c.second, Call(VL_WS_calcOrderTax, kBuySku)) << "code " << c.first;
   }
   EXPECT_EQ("StreamAPI", Requests(1)[0].service);
   EXPECT_TRUE(TakeLog().empty());
@@ -139,37 +123,30 @@ TEST_F(Purchase, TaxOfAnOrder) {
 
 TEST_F(Purchase, BalancesAndGiftCertificates) {
   Init();
-  VL_WS_BillingInfoAndPPCBalance info;
-  ASSERT_EQ(VL_WS_OK, VL_WS_getBillingInfoAndPPCBalance(&m_Handle, &info));
-  EXPECT_EQ(VL_WS_TAG_BILLING_INFO_RESPONSE, *info.BillingInfo.tag);
-  EXPECT_STREQ("4242", info.BillingInfo.CCLastFour);
-  EXPECT_EQ(1, info.BillingInfo.CCTypeId);
-  EXPECT_STREQ("Visa", info.BillingInfo.CCType);
-  EXPECT_EQ(2500, info.PPCardBalance.Balance);
-  VL_WS_release(&info);
+  VLAnswer<VL_WS_BillingInfoAndPPCBalance> info;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getBillingInfoAndPPCBalance(&m_Handle, info.Fresh()));
+  EXPECT_EQ(VL_WS_TAG_BILLING_INFO_RESPONSE, *info->BillingInfo.tag);
+  EXPECT_STREQ("4242", info->BillingInfo.CCLastFour);
+  EXPECT_EQ(1, info->BillingInfo.CCTypeId);
+  EXPECT_STREQ("Visa", info->BillingInfo.CCType);
+  EXPECT_EQ(2500, info->PPCardBalance.Balance);
   Fault("getBillingInfoAndPPCBalance=code:2,times=1");
-  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getBillingInfoAndPPCBalance(&m_Handle, &info));
-  VL_WS_release(&info);
+  EXPECT_EQ(VL_WS_E_UNEXPECTED, Call(VL_WS_getBillingInfoAndPPCBalance));
 
-  VL_WS_GiftCertificateResponse gift;
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_assignGiftCertificateToUser(&m_Handle, "", &gift));
-  VL_WS_release(&gift);
-  EXPECT_EQ(VL_WS_E_GIFT_CERTIFICATE_1, VL_WS_assignGiftCertificateToUser(&m_Handle, "GIFT-NONE", &gift));
-  VL_WS_release(&gift);
-  ASSERT_EQ(VL_WS_OK, VL_WS_assignGiftCertificateToUser(&m_Handle, "GIFT-0500", &gift));
-  EXPECT_EQ(3000, gift.Balance);
-  VL_WS_release(&gift);
-  EXPECT_EQ(VL_WS_E_GIFT_CERTIFICATE_2, VL_WS_assignGiftCertificateToUser(&m_Handle, "GIFT-0500", &gift));
-  VL_WS_release(&gift);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Call(VL_WS_assignGiftCertificateToUser, ""));
+  EXPECT_EQ(VL_WS_E_GIFT_CERTIFICATE_1, Call(VL_WS_assignGiftCertificateToUser, "GIFT-NONE"));
+  VLAnswer<VL_WS_GiftCertificateResponse> gift;
+  ASSERT_EQ(VL_WS_OK, VL_WS_assignGiftCertificateToUser(&m_Handle, "GIFT-0500", gift.Fresh()));
+  EXPECT_EQ(3000, gift->Balance);
+  EXPECT_EQ(VL_WS_E_GIFT_CERTIFICATE_2, Call(VL_WS_assignGiftCertificateToUser, "GIFT-0500"));
 
-  VL_WS_PrePaidCardBalanceResponse balance;
-  ASSERT_EQ(VL_WS_OK, VL_WS_getPrePaidCardBalance(&m_Handle, &balance));
-  EXPECT_EQ(3000, balance.Balance);
-  VL_WS_release(&balance);
-  EXPECT_EQ((std::vector<std::string>{"VL_WS_assignGiftCertificateToUser, ret:0,responseCode:1",
-                                      "VL_WS_assignGiftCertificateToUser, ret:0,responseCode:0",
-                                      "VL_WS_assignGiftCertificateToUser, ret:0,responseCode:2",
-                                      "VL_WS_getPrePaidCardBalance, ret:0,responseCode:0"}),
+  VLAnswer<VL_WS_PrePaidCardBalanceResponse> balance;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getPrePaidCardBalance(&m_Handle, balance.Fresh()));
+  EXPECT_EQ(3000, balance->Balance);
+  EXPECT_EQ((Lines{"VL_WS_assignGiftCertificateToUser, ret:0,responseCode:1",
+                   "VL_WS_assignGiftCertificateToUser, ret:0,responseCode:0",
+                   "VL_WS_assignGiftCertificateToUser, ret:0,responseCode:2",
+                   "VL_WS_getPrePaidCardBalance, ret:0,responseCode:0"}),
             TakeLog());
 }
 
@@ -184,37 +161,31 @@ TEST_F(Purchase, PurchasedTitlesAndRentals) {
   EXPECT_EQ(VL_WS_OK, VL_WS_checkForPurchasedSku(&m_Handle, kRentalSku + 1, &purchased));
   EXPECT_FALSE(purchased);
 
-  VL_WS_RentalExpirationResponse rental;
-  ASSERT_EQ(VL_WS_OK, VL_WS_checkRentalExpiration(&m_Handle, pass, &rental));
-  EXPECT_FALSE(rental.ShouldDisplay);
-  EXPECT_EQ(48, rental.HoursRemaining);
-  VL_WS_release(&rental);
-  m_Sim.Store().AdvanceClock(30 * 3600);
-  ASSERT_EQ(VL_WS_OK, VL_WS_checkRentalExpiration(&m_Handle, pass, &rental));
-  m_Sim.Store().AdvanceClock(-30 * 3600);
-  EXPECT_TRUE(rental.ShouldDisplay);
-  EXPECT_EQ(18, rental.HoursRemaining);
-  VL_WS_release(&rental);
+  // Just rented, and 30 hours later.
+  for (int hoursLeft : {48, 18}) {
+    VLAnswer<VL_WS_RentalExpirationResponse> rental;
+    m_Sim.Store().AdvanceClock((48 - hoursLeft) * 3600);
+    ASSERT_EQ(VL_WS_OK, VL_WS_checkRentalExpiration(&m_Handle, pass, rental.Fresh()));
+    m_Sim.Store().AdvanceClock(-(48 - hoursLeft) * 3600);
+    EXPECT_EQ(hoursLeft < 48, rental->ShouldDisplay);
+    EXPECT_EQ(hoursLeft, rental->HoursRemaining);
+  }
 
   const int passes[] = {pass, 999999};
-  VL_WS_TitleListingPurchasedForPassArray titles;
-  ASSERT_EQ(VL_WS_OK, VL_WS_getTitleListingPurchaseds(&m_Handle, 2, passes, &titles));
-  ASSERT_EQ(2, titles.Count);
-  EXPECT_EQ(0, titles.Items[0].ResponseCode);
-  EXPECT_EQ(1002, titles.Items[0].TitleID);
-  EXPECT_EQ(pass, titles.Items[0].PassID);
-  EXPECT_EQ(2, titles.Items[1].ResponseCode);
-  VL_WS_release(&titles);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitleListingPurchaseds(&m_Handle, 0, passes, &titles));
-  VL_WS_release(&titles);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitleListingPurchaseds(&m_Handle, 2, nullptr, &titles));
-  VL_WS_release(&titles);
+  VLAnswer<VL_WS_TitleListingPurchasedForPassArray> titles;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getTitleListingPurchaseds(&m_Handle, 2, passes, titles.Fresh()));
+  ASSERT_EQ(2, titles->Count);
+  EXPECT_EQ(0, titles->Items[0].ResponseCode);
+  EXPECT_EQ(1002, titles->Items[0].TitleID);
+  EXPECT_EQ(pass, titles->Items[0].PassID);
+  EXPECT_EQ(2, titles->Items[1].ResponseCode);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Call(VL_WS_getTitleListingPurchaseds, 0, passes));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Call(VL_WS_getTitleListingPurchaseds, 2, static_cast<const int*>(nullptr)));
 
   EXPECT_EQ(
-      (std::vector<std::string>{
-          "VL_WS_doPurchaseSavedBilling, ret:0,responseCode:0", "VL_WS_checkForPurchasedTitle, result:1",
-          "VL_WS_checkForPurchasedSku, result:1", "VL_WS_checkForPurchasedSku, result:0",
-          "VL_WS_checkRentalExpiration, ret:0,responseCode:0", "VL_WS_checkRentalExpiration, ret:0,responseCode:0"}),
+      (Lines{"VL_WS_doPurchaseSavedBilling, ret:0,responseCode:0", "VL_WS_checkForPurchasedTitle, result:1",
+             "VL_WS_checkForPurchasedSku, result:1", "VL_WS_checkForPurchasedSku, result:0",
+             "VL_WS_checkRentalExpiration, ret:0,responseCode:0", "VL_WS_checkRentalExpiration, ret:0,responseCode:0"}),
       TakeLog());
 }
 
@@ -224,14 +195,10 @@ TEST_F(Purchase, PurchasedTitleFollowsTheStoresFileType) {
   EXPECT_EQ(VL_WS_OK, VL_WS_checkForPurchasedTitle(&m_Handle, 1002, &purchased));
   EXPECT_FALSE(purchased);
   m_Sim.Store().SetAccessType(DOWNLOAD);
-  VL_WS_FileType type;
-  EXPECT_EQ(VL_WS_OK, VL_WS_getFileType(&m_Handle, &type));
+  EXPECT_EQ(VL_WS_OK, Call(VL_WS_getFileType));
   m_Sim.Store().SetAccessType(STREAM);
-  VL_WS_release(&type);
   EXPECT_EQ(VL_WS_OK, VL_WS_checkForPurchasedTitle(&m_Handle, 1002, &purchased));
-  VL_WS_PrePaidCardBalanceResponse balance;  // a dispatched operation keeps its service
-  EXPECT_EQ(VL_WS_OK, VL_WS_getPrePaidCardBalance(&m_Handle, &balance));
-  VL_WS_release(&balance);
+  EXPECT_EQ(VL_WS_OK, Call(VL_WS_getPrePaidCardBalance));  // a dispatched operation keeps its service
 
   std::vector<VLSimRequest> requests = Requests(4);
   ASSERT_EQ(4u, requests.size());
@@ -245,14 +212,11 @@ TEST_F(Purchase, PurchasedTitleFollowsTheStoresFileType) {
 TEST_F(Purchase, RemovingAllPurchasesNeedsThePassword) {
   Init();
   Buy(kBuySku);
-  VL_WS_StandardResponse answer;
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_removeAllMyPurchases(&m_Handle, nullptr, &answer));
-  VL_WS_release(&answer);
-  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_removeAllMyPurchases(&m_Handle, "wrong", &answer));
-  EXPECT_EQ(2, answer.ResponseCode);
-  VL_WS_release(&answer);
-  EXPECT_EQ(VL_WS_OK, VL_WS_removeAllMyPurchases(&m_Handle, "alicepw", &answer));
-  VL_WS_release(&answer);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Call(VL_WS_removeAllMyPurchases, static_cast<const char*>(nullptr)));
+  VLAnswer<VL_WS_StandardResponse> answer;
+  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_removeAllMyPurchases(&m_Handle, "wrong", answer.Fresh()));
+  EXPECT_EQ(2, answer->ResponseCode);
+  EXPECT_EQ(VL_WS_OK, Call(VL_WS_removeAllMyPurchases, "alicepw"));
   bool purchased = true;
   EXPECT_EQ(VL_WS_OK, VL_WS_checkForPurchasedSku(&m_Handle, kBuySku, &purchased));
   EXPECT_FALSE(purchased);
@@ -260,21 +224,18 @@ TEST_F(Purchase, RemovingAllPurchasesNeedsThePassword) {
 
 TEST_F(Purchase, BillingInfoIsKeptAndHasItsOwnStatuses) {
   Init(STREAM, VL_WS_CacheParam::CACHE_USERDATA);
-  const std::vector<std::pair<int, VL_WS_Status>> codes = {
-      {1, -1008}, {2, -1017}, {3, -1011}, {4, -1012}, {5, VL_WS_E_UNEXPECTED}};
-  VL_WS_BillingInfoResponse info;
+  const Codes codes = {{1, -1008}, {2, -1017}, {3, -1011}, {4, -1012}, {5, kOther}};
+  VLAnswer<VL_WS_BillingInfoResponse> info;
   for (const auto& c : codes) {
     SCOPED_TRACE(c.first);
     Fault("getBillingInfo=code:" + std::to_string(c.first) + ",times=1");
-    EXPECT_EQ(c.second, VL_WS_getBillingInfo(&m_Handle, &info));
-    EXPECT_EQ(c.first, info.ResponseCode);
-    VL_WS_release(&info);
+    EXPECT_EQ(c.second, VL_WS_getBillingInfo(&m_Handle, info.Fresh()));
+    EXPECT_EQ(c.first, info->ResponseCode);
   }
   for (int i = 0; i < 2; ++i) {
-    ASSERT_EQ(VL_WS_OK, VL_WS_getBillingInfo(&m_Handle, &info));
-    EXPECT_STREQ("4242", info.CCLastFour);
-    EXPECT_STREQ("Visa", info.CCType);
-    VL_WS_release(&info);
+    ASSERT_EQ(VL_WS_OK, VL_WS_getBillingInfo(&m_Handle, info.Fresh()));
+    EXPECT_STREQ("4242", info->CCLastFour);
+    EXPECT_STREQ("Visa", info->CCType);
   }
   EXPECT_EQ(codes.size() + 1, Requests(codes.size() + 1).size());
 }
@@ -283,19 +244,17 @@ TEST_F(Purchase, MyVideosAreKeptOnlyFromTheStreamingService) {
   Init(STREAM, 7);
   const int pass = Buy(kRentalSku);
   Buy(kBuySku);
-  VL_WS_MyVideosResponse videos;
+  VLAnswer<VL_WS_MyVideosResponse> videos;
   for (int i = 0; i < 2; ++i) {
-    ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 0, 0, 3, &videos));  // rentals, any watch status
-    ASSERT_EQ(1, videos.Titles.Count);
-    EXPECT_EQ(pass, videos.Titles.Items[0].PassID);
-    EXPECT_EQ(1002, videos.Titles.Items[0].TitleID);
-    EXPECT_EQ(1, videos.TotalItems);
-    VL_WS_release(&videos);
+    ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 0, 0, 3, videos.Fresh()));  // rentals, any watch status
+    ASSERT_EQ(1, videos->Titles.Count);
+    EXPECT_EQ(pass, videos->Titles.Items[0].PassID);
+    EXPECT_EQ(1002, videos->Titles.Items[0].TitleID);
+    EXPECT_EQ(1, videos->TotalItems);
   }
-  ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 1, 0, 3, &videos));  // another purchase type asks
-  ASSERT_EQ(1, videos.Titles.Count);
-  EXPECT_EQ(1001, videos.Titles.Items[0].TitleID);
-  VL_WS_release(&videos);
+  ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 1, 0, 3, videos.Fresh()));  // another purchase type asks
+  ASSERT_EQ(1, videos->Titles.Count);
+  EXPECT_EQ(1001, videos->Titles.Items[0].TitleID);
   std::vector<VLSimRequest> requests = Requests(4);
   ASSERT_EQ(4u, requests.size());
   EXPECT_EQ("getMyStreamingVideos", requests[2].operation);
@@ -303,9 +262,8 @@ TEST_F(Purchase, MyVideosAreKeptOnlyFromTheStreamingService) {
 
   Init(DOWNLOAD, 7);
   for (int i = 0; i < 2; ++i) {
-    ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 0, 0, 3, &videos));
-    EXPECT_EQ(1, videos.Titles.Count);
-    VL_WS_release(&videos);
+    ASSERT_EQ(VL_WS_OK, VL_WS_getMyVideos(&m_Handle, 1, 10, 0, 0, 3, videos.Fresh()));
+    EXPECT_EQ(1, videos->Titles.Count);
   }
   requests = Requests(2);
   ASSERT_EQ(2u, requests.size());

@@ -3,7 +3,6 @@
 // refused answers. Whatever the handle's access type, they go to the streaming service.
 #include <gtest/gtest.h>
 
-#include <functional>
 #include <string>
 #include <vector>
 
@@ -11,10 +10,10 @@
 
 namespace {
 
-const int kStandard = 1;       // file profile STANDARD
-const int kPaused = 2;         // stream status paused
-const int kDolbyPlus51 = 3;    // audio profile Dolby_Digital_Plus_51
-const int kStereo = 0;         // audio profile Stereo_Standard
+const int kStandard = 1;     // file profile STANDARD
+const int kPaused = 2;       // stream status paused
+const int kDolbyPlus51 = 3;  // audio profile Dolby_Digital_Plus_51
+const int kStereo = 0;       // audio profile Stereo_Standard
 const int kBonusTrailer = 10015;
 
 class Streaming : public VLTestAccountClient {
@@ -35,49 +34,44 @@ class Streaming : public VLTestAccountClient {
 TEST_F(Streaming, LocationOfAPassAndReportsOfItsInstance) {
   Init();
   const int pass = Pass(10022);
-  VL_WS_StreamingAssetLocationResponse location;
-  ASSERT_EQ(VL_WS_OK, VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, &location));
-  EXPECT_EQ(0, location.ResponseCode);
-  EXPECT_NE(std::string::npos, std::string(location.StreamingAssetLocation).find("/media/stream/"));
-  EXPECT_EQ(pass, location.AssetID);
-  EXPECT_STRNE("", location.DRMServerURL);
-  EXPECT_STRNE("", location.DRMACKServerURL);
-  EXPECT_STRNE("", location.HeartbeatURL);
-  EXPECT_EQ(60, location.HeartbeatPollInSeconds);
-  EXPECT_EQ(0, location.Status);
-  const std::string stream = location.StreamID;
-  VL_WS_release(&location);
+  VLAnswer<VL_WS_StreamingAssetLocationResponse> location;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, location.Fresh()));
+  EXPECT_EQ(0, location->ResponseCode);
+  EXPECT_NE(std::string::npos, std::string(location->StreamingAssetLocation).find("/media/stream/"));
+  EXPECT_EQ(pass, location->AssetID);
+  EXPECT_STRNE("", location->DRMServerURL);
+  EXPECT_STRNE("", location->DRMACKServerURL);
+  EXPECT_STRNE("", location->HeartbeatURL);
+  EXPECT_EQ(60, location->HeartbeatPollInSeconds);
+  EXPECT_EQ(0, location->Status);
+  const std::string stream = location->StreamID;
 
-  VL_WS_StandardResponse answer;
-  ASSERT_EQ(VL_WS_OK, VL_WS_manageStreamingInstanceStatus(&m_Handle, stream.c_str(), kPaused, 300, &answer));
-  VL_WS_release(&answer);
+  ASSERT_EQ(VL_WS_OK, Call(VL_WS_manageStreamingInstanceStatus, stream.c_str(), kPaused, 300));
   std::vector<VLSimStatusReport> reports = m_Sim.Store().StatusReports();
   ASSERT_FALSE(reports.empty());
   EXPECT_EQ(stream, reports.back().stream);
   EXPECT_EQ(kPaused, reports.back().status);
   EXPECT_EQ(300, reports.back().stopSeconds);
 
-  ASSERT_EQ(VL_WS_OK, VL_WS_loadLastStreamingAssetLocation(&m_Handle, pass, kStandard, &location));
-  EXPECT_EQ(stream, location.StreamID);
-  EXPECT_EQ(kPaused, location.Status);
-  EXPECT_EQ(300, location.StartTimeSeconds);
-  VL_WS_release(&location);
+  ASSERT_EQ(VL_WS_OK, VL_WS_loadLastStreamingAssetLocation(&m_Handle, pass, kStandard, location.Fresh()));
+  EXPECT_EQ(stream, location->StreamID);
+  EXPECT_EQ(kPaused, location->Status);
+  EXPECT_EQ(300, location->StartTimeSeconds);
 
-  ASSERT_EQ(VL_WS_OK, VL_WS_getStreamingBonusAssetLocation(&m_Handle, kBonusTrailer, &location));
-  EXPECT_EQ(kBonusTrailer, location.AssetID);
-  VL_WS_release(&location);
+  ASSERT_EQ(VL_WS_OK, VL_WS_getStreamingBonusAssetLocation(&m_Handle, kBonusTrailer, location.Fresh()));
+  EXPECT_EQ(kBonusTrailer, location->AssetID);
   EXPECT_TRUE(TakeLog().empty());
 }
 
 TEST_F(Streaming, EmptyStreamIDIsRefusedWithoutARequest) {
   Init();
   for (const char* stream : {static_cast<const char*>(nullptr), ""}) {
-    VL_WS_StandardResponse answer;
-    EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_manageStreamingInstanceStatus(&m_Handle, stream, kPaused, 0, &answer));
-    EXPECT_EQ(VL_WS_TAG_STANDARD_RESPONSE, *answer.tag);
-    EXPECT_EQ(0, answer.ResponseCode);
-    EXPECT_EQ(nullptr, answer.ResponseMessage);
-    VL_WS_release(&answer);
+    VLAnswer<VL_WS_StandardResponse> answer;
+    EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT,
+              VL_WS_manageStreamingInstanceStatus(&m_Handle, stream, kPaused, 0, answer.Fresh()));
+    EXPECT_EQ(VL_WS_TAG_STANDARD_RESPONSE, *answer->tag);
+    EXPECT_EQ(0, answer->ResponseCode);
+    EXPECT_EQ(nullptr, answer->ResponseMessage);
   }
   EXPECT_TRUE(RequestsNow().empty());
 }
@@ -86,52 +80,44 @@ TEST_F(Streaming, RefusalFoldsIntoTheStatusOfLocationsNotOfTHX) {
   Init();
   const int pass = Pass(10021);  // rented for 48 hours
   m_Sim.Store().AdvanceClock(49 * 3600);
-  VL_WS_StreamingAssetLocationResponse location;
-  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, &location));
+  VLAnswer<VL_WS_StreamingAssetLocationResponse> location;
+  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, location.Fresh()));
   m_Sim.Store().AdvanceClock(-49 * 3600);
-  EXPECT_EQ(3, location.ResponseCode);
-  EXPECT_STREQ("The rental has expired", location.ResponseMessage);
-  EXPECT_STREQ("", location.StreamID);
-  VL_WS_release(&location);
+  EXPECT_EQ(3, location->ResponseCode);
+  EXPECT_STREQ("The rental has expired", location->ResponseMessage);
+  EXPECT_STREQ("", location->StreamID);
 
   // Title 1002 has no THX settings: the store's code 6 stays in the record.
-  VL_WS_THXMediaDirectorResponse thx;
-  EXPECT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirector(&m_Handle, pass, kStandard, kDolbyPlus51, &thx));
-  EXPECT_EQ(6, thx.ResponseCode);
-  EXPECT_STREQ("No THX media director settings", thx.ResponseMessage);
-  VL_WS_release(&thx);
+  VLAnswer<VL_WS_THXMediaDirectorResponse> thx;
+  EXPECT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirector(&m_Handle, pass, kStandard, kDolbyPlus51, thx.Fresh()));
+  EXPECT_EQ(6, thx->ResponseCode);
+  EXPECT_STREQ("No THX media director settings", thx->ResponseMessage);
   const int thxPass = Pass(10012);  // title 1001 has them
-  ASSERT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirector(&m_Handle, thxPass, kStandard, kDolbyPlus51, &thx));
-  EXPECT_EQ(0, thx.ResponseCode);
-  EXPECT_STRNE("", thx.LongFormat);
-  EXPECT_STRNE("", thx.ShortFormat);
-  VL_WS_release(&thx);
+  ASSERT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirector(&m_Handle, thxPass, kStandard, kDolbyPlus51, thx.Fresh()));
+  EXPECT_EQ(0, thx->ResponseCode);
+  EXPECT_STRNE("", thx->LongFormat);
+  EXPECT_STRNE("", thx->ShortFormat);
   Fault("getTHXMediaDirector=code:3,times=1");
-  EXPECT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirector(&m_Handle, thxPass, kStandard, kDolbyPlus51, &thx));
-  EXPECT_EQ(3, thx.ResponseCode);
-  VL_WS_release(&thx);
-  ASSERT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirectorBonusAsset(&m_Handle, kBonusTrailer, kStandard, 0, &thx));
-  EXPECT_STRNE("", thx.ShortFormat);
-  VL_WS_release(&thx);
+  EXPECT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirector(&m_Handle, thxPass, kStandard, kDolbyPlus51, thx.Fresh()));
+  EXPECT_EQ(3, thx->ResponseCode);
+  ASSERT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirectorBonusAsset(&m_Handle, kBonusTrailer, kStandard, 0, thx.Fresh()));
+  EXPECT_STRNE("", thx->ShortFormat);
 
   Fault("getStreamingAssetLocation=soapfault");
-  EXPECT_EQ(VL_WS_E_SOAP_FAULT(2), VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, &location));
-  EXPECT_EQ(nullptr, location.StreamingAssetLocation);
-  VL_WS_release(&location);
+  EXPECT_EQ(VL_WS_E_SOAP_FAULT(2), VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, location.Fresh()));
+  EXPECT_EQ(nullptr, location->StreamingAssetLocation);
 }
 
 TEST_F(Streaming, DefaultAudioProfile) {
   Init();
-  VL_WS_StandardResponse answer;
-  ASSERT_EQ(VL_WS_OK, VL_WS_setAudioDefaultProperty(&m_Handle, kStereo, &answer));
-  VL_WS_release(&answer);
+  ASSERT_EQ(VL_WS_OK, Call(VL_WS_setAudioDefaultProperty, kStereo));
   int profile = -1;
   ASSERT_EQ(VL_WS_OK, VL_WS_getAudioDefaultProperty(&m_Handle, &profile));
   EXPECT_EQ(kStereo, profile);
   Fault("setAudioDefaultProperty=code:4,times=1");
-  EXPECT_EQ(VL_WS_OK, VL_WS_setAudioDefaultProperty(&m_Handle, kDolbyPlus51, &answer));
-  EXPECT_EQ(4, answer.ResponseCode);
-  VL_WS_release(&answer);
+  VLAnswer<VL_WS_StandardResponse> answer;
+  EXPECT_EQ(VL_WS_OK, VL_WS_setAudioDefaultProperty(&m_Handle, kDolbyPlus51, answer.Fresh()));
+  EXPECT_EQ(4, answer->ResponseCode);
   EXPECT_EQ((std::vector<std::string>{"VL_WS_setAudioDefaultProperty, ret:0,responseCode:0",
                                       "VL_WS_getAudioDefaultProperty, ret:0,audioprofile:0",
                                       "VL_WS_setAudioDefaultProperty, ret:0,responseCode:4"}),
@@ -141,50 +127,16 @@ TEST_F(Streaming, DefaultAudioProfile) {
 TEST_F(Streaming, AlwaysTheStreamingServiceWhateverTheAccessType) {
   Init(DOWNLOAD);
   const int pass = Pass(10022);
-  std::vector<std::function<void()>> calls = {
-      [&] {
-        VL_WS_StreamingAssetLocationResponse r;
-        VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, &r);
-        VL_WS_release(&r);
-      },
-      [&] {
-        VL_WS_StreamingAssetLocationResponse r;
-        VL_WS_getStreamingBonusAssetLocation(&m_Handle, kBonusTrailer, &r);
-        VL_WS_release(&r);
-      },
-      [&] {
-        VL_WS_StreamingAssetLocationResponse r;
-        VL_WS_loadLastStreamingAssetLocation(&m_Handle, pass, kStandard, &r);
-        VL_WS_release(&r);
-      },
-      [&] {
-        VL_WS_StandardResponse r;
-        VL_WS_manageStreamingInstanceStatus(&m_Handle, "STREAM-X", kPaused, 0, &r);
-        VL_WS_release(&r);
-      },
-      [&] {
-        VL_WS_THXMediaDirectorResponse r;
-        VL_WS_getTHXMediaDirector(&m_Handle, pass, kStandard, kStereo, &r);
-        VL_WS_release(&r);
-      },
-      [&] {
-        VL_WS_THXMediaDirectorResponse r;
-        VL_WS_getTHXMediaDirectorBonusAsset(&m_Handle, kBonusTrailer, kStandard, 0, &r);
-        VL_WS_release(&r);
-      },
-      [&] {
-        VL_WS_StandardResponse r;
-        VL_WS_setAudioDefaultProperty(&m_Handle, kDolbyPlus51, &r);
-        VL_WS_release(&r);
-      },
-      [&] {
-        int profile = 0;
-        VL_WS_getAudioDefaultProperty(&m_Handle, &profile);
-      },
-  };
-  for (auto& call : calls) call();
-  std::vector<VLSimRequest> requests = Requests(calls.size());
-  ASSERT_EQ(calls.size(), requests.size());
+  Call(VL_WS_getStreamingAssetLocation, pass, kStandard);
+  Call(VL_WS_getStreamingBonusAssetLocation, kBonusTrailer);
+  Call(VL_WS_loadLastStreamingAssetLocation, pass, kStandard);
+  Call(VL_WS_manageStreamingInstanceStatus, "STREAM-X", kPaused, 0);
+  Call(VL_WS_getTHXMediaDirector, pass, kStandard, kStereo);
+  Call(VL_WS_getTHXMediaDirectorBonusAsset, kBonusTrailer, kStandard, 0);
+  Call(VL_WS_setAudioDefaultProperty, kDolbyPlus51);
+  Call(VL_WS_getAudioDefaultProperty);
+  std::vector<VLSimRequest> requests = Requests(8);
+  ASSERT_EQ(8u, requests.size());
   for (const VLSimRequest& request : requests) {
     EXPECT_EQ("StreamAPI", request.service) << request.operation;
     EXPECT_EQ("VL1:StreamDeviceRequestSettings", request.settingsElement) << request.operation;

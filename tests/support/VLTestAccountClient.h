@@ -6,12 +6,34 @@
 #define VLTESTACCOUNTCLIENT_H
 
 #include <string>
+#include <tuple>
+#include <type_traits>
 #include <vector>
 
 #include "CacheInterface.h"
 #include "VLTestDir.h"
 #include "VLTestSimulator.h"
 #include "VL_WS_Client.h"
+
+// A record of the interface that is given back before it is filled again and at the end of its
+// scope: pass Fresh() to the operation, read the fields through ->.
+template <class Record>
+class VLAnswer {
+ public:
+  VLAnswer() = default;
+  VLAnswer(const VLAnswer&) = delete;
+  VLAnswer& operator=(const VLAnswer&) = delete;
+  ~VLAnswer() { VL_WS_release(&m_Record); }
+
+  Record* Fresh() {
+    VL_WS_release(&m_Record);
+    return &m_Record;
+  }
+  const Record* operator->() const { return &m_Record; }
+
+ private:
+  Record m_Record{};
+};
 
 class VLTestAccountClient : public VLSimClientTest {
  protected:
@@ -30,6 +52,18 @@ class VLTestAccountClient : public VLSimClientTest {
   int Account() const { return m_Account; }
   VL_WS_SetupParams2& Settings() { return m_Handle.client->m_Params; }
   CacheInterface& Cache() { return *m_Handle.client->m_Cache; }
+
+  // Calls an operation on m_Handle whose last parameter is the record (or value) it fills, and
+  // gives the record back: for calls whose effect shows in the status, the store, the request log
+  // or the cache.
+  template <class... Params, class... Args>
+  VL_WS_Status Call(VL_WS_Status (*operation)(VL_WS_Handle*, Params...), Args... args) {
+    using Filled = std::remove_pointer_t<std::tuple_element_t<sizeof...(Params) - 1, std::tuple<Params...>>>;
+    Filled filled{};
+    VL_WS_Status status = operation(&m_Handle, args..., &filled);
+    if constexpr (std::is_class_v<Filled>) VL_WS_release(&filled);
+    return status;
+  }
 
   // The request log as it is: for checking that nothing was asked.
   std::vector<VLSimRequest> RequestsNow() { return m_Sim.Requests(); }
