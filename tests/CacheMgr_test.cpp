@@ -40,6 +40,15 @@ bool HasUser(CacheMgr& cache, const char* name, const char* key) {
   return cache.ReadUserData(name, key, value);
 }
 
+// The wishlist flag of a title: 1 or 0, or -1 when there is none (after checking that a miss
+// leaves the output false).
+int Flag(CacheMgr& cache, int titleID) {
+  bool flag = true;
+  if (cache.ReadWishlistFlag(titleID, flag)) return flag;
+  EXPECT_FALSE(flag) << titleID;
+  return -1;
+}
+
 bool HasBoxArt(CacheMgr& cache, const std::string& prefix, VL_WS_BoxArtSize dim) {
   unsigned size, needUpdate;
   VLString lastModified, data;
@@ -51,7 +60,6 @@ bool HasBoxArt(CacheMgr& cache, const std::string& prefix, VL_WS_BoxArtSize dim)
 void ExpectOnlyKinds(CacheMgr& cache, int data) {
   SCOPED_TRACE(testing::Message() << "cache data " << data);
   VLString value("x");
-  bool flag = true;
   if (!(data & 1)) {
     EXPECT_FALSE(cache.ReadMetaData("n", "k", value));
     EXPECT_EQ("", Str(value));
@@ -63,8 +71,7 @@ void ExpectOnlyKinds(CacheMgr& cache, int data) {
     EXPECT_FALSE(cache.SetBoxArtNeedUpdate());
   }
   if (!(data & 4)) {
-    EXPECT_FALSE(cache.ReadWishlistFlag(1, flag));
-    EXPECT_FALSE(flag);
+    EXPECT_EQ(-1, Flag(cache, 1));
     EXPECT_FALSE(cache.WriteUserData("n", "k", "v"));
     EXPECT_FALSE(cache.PurgeUserData(""));
     EXPECT_FALSE(cache.WriteWishlistFlag(1, true));
@@ -185,9 +192,7 @@ TEST_P(CacheKinds, UserDataEvictionEmptiesServiceTooAndNoBudgetNeverEvicts) {
   ASSERT_TRUE(m_Cache.WriteWishlistFlag(5, true));  // finds 151 > 150
   EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
   EXPECT_FALSE(HasUser(m_Cache, "u", "1"));
-  bool flag = false;
-  EXPECT_TRUE(m_Cache.ReadWishlistFlag(5, flag));
-  EXPECT_TRUE(flag);
+  EXPECT_EQ(1, Flag(m_Cache, 5));
 
   ASSERT_EQ(0, Open(kAllData, 0));
   for (int i = 0; i < 5; ++i) {
@@ -241,30 +246,24 @@ TEST_P(CacheKinds, LoadTimeChangeEmptiesServiceOnly) {
 
   EXPECT_TRUE(m_Cache.UpdateLastCacheLoadTime("2011-03-02T10:00:00"));
   EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
-  bool flag = false;
-  EXPECT_TRUE(m_Cache.ReadWishlistFlag(1, flag));
+  EXPECT_EQ(1, Flag(m_Cache, 1));
 
   EXPECT_FALSE(m_Cache.UpdateLastCacheLoadTime(""));
 }
 
 TEST_P(CacheKinds, WishlistFlags) {
   ASSERT_EQ(0, Open(kAllData));
-  bool flag = true;
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(7, flag));
-  EXPECT_FALSE(flag);
+  EXPECT_EQ(-1, Flag(m_Cache, 7));
   ASSERT_TRUE(m_Cache.WriteWishlistFlag(7, false));
-  flag = true;
-  EXPECT_TRUE(m_Cache.ReadWishlistFlag(7, flag));
-  EXPECT_FALSE(flag);
+  EXPECT_EQ(0, Flag(m_Cache, 7));
   ASSERT_TRUE(m_Cache.WriteWishlistFlag(-3, true));
-  EXPECT_TRUE(m_Cache.ReadWishlistFlag(-3, flag));
-  EXPECT_TRUE(flag);
+  EXPECT_EQ(1, Flag(m_Cache, -3));
   // A flag is a user-data row under "WishlistFlag" and the title in decimal.
   VLString value;
   EXPECT_TRUE(m_Cache.ReadUserData("WishlistFlag", "-3", value));
   EXPECT_EQ("1", Str(value));
   EXPECT_TRUE(m_Cache.RemoveWishlistFlag(7));
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(7, flag));
+  EXPECT_EQ(-1, Flag(m_Cache, 7));
   EXPECT_TRUE(m_Cache.RemoveWishlistFlag(7));  // no row: still done
 
   // Lists must be non-empty and of one length.
@@ -274,13 +273,12 @@ TEST_P(CacheKinds, WishlistFlags) {
   VLWS_BoolVector flags(titleFlags, titleFlags + 2);
   EXPECT_FALSE(m_Cache.WriteWishlistFlags(VLWS_IntVector(), VLWS_BoolVector()));
   EXPECT_FALSE(m_Cache.WriteWishlistFlags(ids, flags));
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(1, flag));
+  EXPECT_EQ(-1, Flag(m_Cache, 1));
   flags.push_back(true);
   ASSERT_TRUE(m_Cache.WriteWishlistFlags(ids, flags));
-  for (int id = 1; id <= 3; ++id) {
-    ASSERT_TRUE(m_Cache.ReadWishlistFlag(id, flag)) << id;
-    EXPECT_EQ(id != 2, flag) << id;
-  }
+  EXPECT_EQ(1, Flag(m_Cache, 1));
+  EXPECT_EQ(0, Flag(m_Cache, 2));
+  EXPECT_EQ(1, Flag(m_Cache, 3));
 }
 
 TEST_P(CacheKinds, PurgeUserDataByNameOrAll) {
@@ -301,8 +299,7 @@ TEST_P(CacheKinds, PurgeUserDataByNameOrAll) {
 
   // The wishlist flags take the cached title answers with them, which carry the same flags.
   EXPECT_TRUE(m_Cache.RemoveAllWishlistFlags());
-  bool flag = false;
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(1, flag));
+  EXPECT_EQ(-1, Flag(m_Cache, 1));
   EXPECT_TRUE(HasUser(m_Cache, "getEmailAddress", ""));
   for (const char* name : titleAnswers) EXPECT_FALSE(HasMeta(m_Cache, name, "1")) << name;
   EXPECT_TRUE(HasMeta(m_Cache, "getTitles", "1,1,20,2"));
@@ -501,9 +498,8 @@ TEST(CacheSharing, TwoObjectsOnOneFileFromTwoThreadsLoseNothing) {
   ASSERT_EQ(0, check.Open(Params(kFile, kAllData, 0, path)));
   for (int thread = 0; thread < 2; ++thread) {
     for (int i = 0; i < kRounds; ++i) {
-      bool flag = false;
       EXPECT_TRUE(HasMeta(check, "getTitles", key(thread, i).c_str())) << key(thread, i);
-      EXPECT_TRUE(check.ReadWishlistFlag(thread * 100000 + i, flag)) << key(thread, i);
+      EXPECT_EQ(1, Flag(check, thread * 100000 + i)) << key(thread, i);
     }
   }
 }
