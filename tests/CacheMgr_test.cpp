@@ -40,6 +40,46 @@ bool HasUser(CacheMgr& cache, const char* name, const char* key) {
   return cache.ReadUserData(name, key, value);
 }
 
+// The wishlist flag of a title: 1 or 0, or -1 when there is none (after checking that a miss
+// leaves the output false).
+int Flag(CacheMgr& cache, int titleID) {
+  bool flag = true;
+  if (cache.ReadWishlistFlag(titleID, flag)) return flag;
+  EXPECT_FALSE(flag) << titleID;
+  return -1;
+}
+
+bool HasBoxArt(CacheMgr& cache, const std::string& prefix, VL_WS_BoxArtSize dim) {
+  unsigned size, needUpdate;
+  VLString lastModified, data;
+  return cache.ReadBoxArt(prefix.c_str(), dim, size, lastModified, needUpdate, data);
+}
+
+// Every operation on a kind whose bit is off in data is refused, and its reads miss with an
+// emptied output (data 0: a type-0 or closed cache).
+void ExpectOnlyKinds(CacheMgr& cache, int data) {
+  SCOPED_TRACE(testing::Message() << "cache data " << data);
+  VLString value("x");
+  if (!(data & 1)) {
+    EXPECT_FALSE(cache.ReadMetaData("n", "k", value));
+    EXPECT_EQ("", Str(value));
+    EXPECT_FALSE(cache.WriteMetaData("n", "k", "v"));
+    EXPECT_FALSE(cache.UpdateLastCacheLoadTime("t"));
+  }
+  if (!(data & 2)) {
+    EXPECT_FALSE(cache.WriteBoxArt("p", VL_WS_BOXART_95, 1, "", 0, "d"));
+    EXPECT_FALSE(cache.SetBoxArtNeedUpdate());
+  }
+  if (!(data & 4)) {
+    EXPECT_EQ(-1, Flag(cache, 1));
+    EXPECT_FALSE(cache.WriteUserData("n", "k", "v"));
+    EXPECT_FALSE(cache.PurgeUserData(""));
+    EXPECT_FALSE(cache.WriteWishlistFlag(1, true));
+    EXPECT_FALSE(cache.RemoveWishlistFlag(1));
+    EXPECT_FALSE(cache.RemoveAllWishlistFlags());
+  }
+}
+
 // Runs one statement on a cache file from outside, as another program would.
 void RunOnFile(const std::string& path, const std::string& sql) {
   sqlite3* db = nullptr;
@@ -48,40 +88,24 @@ void RunOnFile(const std::string& path, const std::string& sql) {
   sqlite3_close(db);
 }
 
-// ---- Budget -------------------------------------------------------------------------------------
-
-TEST(CacheBudget, SplitsFifteenSeventyFifteenAndGivesTheRestToBoxArt) {
+// Box art gets 70%, the others 15% each; the rounding rest goes to box art, else to user data,
+// else to metadata. Budgets above 2^31 bytes are read as unsigned.
+TEST(CacheBudget, SplitsFifteenSeventyFifteenAndGivesTheRestByKind) {
+  const struct {
+    int data;
+    unsigned limit, meta, boxArt, user;
+  } rows[] = {
+      {kAllData, 1000, 150, 700, 150}, {kAllData, 999, 149, 701, 149}, {kAllData, 0, 0, 0, 0},
+      {1 | 4, 1000, 150, 0, 850},      {1, 1000, 1000, 0, 0},          {2, 3000000000u, 0, 3000000000u, 0},
+  };
   CacheMgr cache;
-  ASSERT_EQ(0, cache.Open(Params(kMemory, kAllData, 1000)));
-  EXPECT_EQ(150u, cache.MetaDataLimit());
-  EXPECT_EQ(700u, cache.BoxArtLimit());
-  EXPECT_EQ(150u, cache.UserDataLimit());
-
-  ASSERT_EQ(0, cache.Open(Params(kMemory, kAllData, 999)));
-  EXPECT_EQ(149u, cache.MetaDataLimit());
-  EXPECT_EQ(701u, cache.BoxArtLimit());
-  EXPECT_EQ(149u, cache.UserDataLimit());
-
-  ASSERT_EQ(0, cache.Open(Params(kMemory, kAllData, 0)));
-  EXPECT_EQ(0u, cache.MetaDataLimit());
-  EXPECT_EQ(0u, cache.BoxArtLimit());
-  EXPECT_EQ(0u, cache.UserDataLimit());
-}
-
-TEST(CacheBudget, RestGoesToUserDataWithoutBoxArtElseToMetadata) {
-  CacheMgr cache;
-  ASSERT_EQ(0, cache.Open(Params(kMemory, 1 | 4, 1000)));
-  EXPECT_EQ(150u, cache.MetaDataLimit());
-  EXPECT_EQ(0u, cache.BoxArtLimit());
-  EXPECT_EQ(850u, cache.UserDataLimit());
-
-  ASSERT_EQ(0, cache.Open(Params(kMemory, 1, 1000)));
-  EXPECT_EQ(1000u, cache.MetaDataLimit());
-
-  // Budgets above 2^31 bytes are read as unsigned.
-  ASSERT_EQ(0, cache.Open(Params(kMemory, 2, static_cast<int>(3000000000u))));
-  EXPECT_EQ(3000000000u, cache.BoxArtLimit());
-
+  for (const auto& row : rows) {
+    SCOPED_TRACE(testing::Message() << "data " << row.data << ", limit " << row.limit);
+    ASSERT_EQ(0, cache.Open(Params(kMemory, row.data, static_cast<int>(row.limit))));
+    EXPECT_EQ(row.meta, cache.MetaDataLimit());
+    EXPECT_EQ(row.boxArt, cache.BoxArtLimit());
+    EXPECT_EQ(row.user, cache.UserDataLimit());
+  }
   cache.Close();
   EXPECT_EQ(0u, cache.BoxArtLimit());
 }
@@ -101,29 +125,22 @@ INSTANTIATE_TEST_SUITE_P(MemoryAndFile, CacheKinds, testing::Values(kMemory, kFi
                            return info.param == kMemory ? "Memory" : "File";
                          });
 
-TEST_P(CacheKinds, MetadataKeepsItsExactBytes) {
+TEST_P(CacheKinds, MetadataKeepsItsExactBytesAndRefusesEmptyNamesAndValues) {
   ASSERT_EQ(0, Open(kAllData));
   const std::string bytes("\x1f\x8b\0\x01zip\0", 8);
-  VLString value(bytes.data(), bytes.size());
-  EXPECT_TRUE(m_Cache.WriteMetaData("getTitles", "1,1,20,2", value));
+  EXPECT_TRUE(m_Cache.WriteMetaData("getTitles", "1,1,20,2", VLString(bytes.data(), bytes.size())));
   VLString read("old");
   EXPECT_TRUE(m_Cache.ReadMetaData("getTitles", "1,1,20,2", read));
   EXPECT_EQ(bytes, Str(read));
-
-  // Other keys and names are misses, and a miss empties the output.
+  // Other keys and names are misses, a miss empties the output, and user data is separate.
   EXPECT_FALSE(m_Cache.ReadMetaData("getTitles", "1,1,10,2", read));
   EXPECT_EQ("", Str(read));
   EXPECT_FALSE(HasMeta(m_Cache, "searchForTitle", "1,1,20,2"));
-  // Service and user data are separate.
   EXPECT_FALSE(HasUser(m_Cache, "getTitles", "1,1,20,2"));
-
   // The empty key is a key like any other (navigation is cached under it).
   EXPECT_TRUE(m_Cache.WriteMetaData("getNavigation", "", "nav"));
   EXPECT_TRUE(HasMeta(m_Cache, "getNavigation", ""));
-}
 
-TEST_P(CacheKinds, EmptyNamesAndValuesAreRefused) {
-  ASSERT_EQ(0, Open(kAllData));
   EXPECT_FALSE(m_Cache.WriteMetaData("", "k", "v"));
   EXPECT_FALSE(m_Cache.WriteMetaData("n", "k", ""));
   EXPECT_FALSE(m_Cache.WriteUserData("", "k", "v"));
@@ -133,34 +150,18 @@ TEST_P(CacheKinds, EmptyNamesAndValuesAreRefused) {
   EXPECT_FALSE(m_Cache.WriteBoxArt("", VL_WS_BOXART_95, 1, "", 0, ""));
 }
 
-TEST_P(CacheKinds, KindsWhoseBitIsOffAreNotCached) {
+TEST_P(CacheKinds, KindsWhoseBitIsOffAndAClosedCacheAnswerNothing) {
   ASSERT_EQ(0, Open(kAllData));
   ASSERT_TRUE(m_Cache.WriteMetaData("n", "k", "v"));
   ASSERT_EQ(0, Open(4));  // user data only; the file keeps its rows
-  VLString value("x");
-  EXPECT_FALSE(m_Cache.ReadMetaData("n", "k", value));
-  EXPECT_EQ("", Str(value));
-  EXPECT_FALSE(m_Cache.WriteMetaData("n", "k", "v"));
-  EXPECT_FALSE(m_Cache.UpdateLastCacheLoadTime("t"));
-  EXPECT_FALSE(m_Cache.WriteBoxArt("p", VL_WS_BOXART_95, 1, "", 0, "d"));
-  EXPECT_FALSE(m_Cache.SetBoxArtNeedUpdate());
+  ExpectOnlyKinds(m_Cache, 4);
   EXPECT_TRUE(m_Cache.WriteWishlistFlag(1, true));
-
   ASSERT_EQ(0, Open(1));
-  bool flag = true;
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(1, flag));
-  EXPECT_FALSE(flag);
-  EXPECT_FALSE(m_Cache.WriteUserData("n", "k", "v"));
-  EXPECT_FALSE(m_Cache.PurgeUserData(""));
-  EXPECT_FALSE(m_Cache.RemoveAllWishlistFlags());
-}
+  ExpectOnlyKinds(m_Cache, 1);
 
-TEST_P(CacheKinds, ClosedCacheAnswersNothing) {
   ASSERT_EQ(0, Open(kAllData));
-  ASSERT_TRUE(m_Cache.WriteMetaData("n", "k", "v"));
   EXPECT_EQ(0, m_Cache.Close());
-  EXPECT_FALSE(HasMeta(m_Cache, "n", "k"));
-  EXPECT_FALSE(m_Cache.WriteMetaData("n", "k", "v"));
+  ExpectOnlyKinds(m_Cache, 0);
   EXPECT_EQ(0, m_Cache.Close());
 }
 
@@ -184,19 +185,15 @@ TEST_P(CacheKinds, MetadataEvictionIsStrictAndEmptiesUserDataToo) {
   EXPECT_FALSE(HasUser(m_Cache, "getEmailAddress", ""));
 }
 
-TEST_P(CacheKinds, UserDataEvictionEmptiesServiceToo) {
+TEST_P(CacheKinds, UserDataEvictionEmptiesServiceTooAndNoBudgetNeverEvicts) {
   ASSERT_EQ(0, Open(kAllData, 1000));
   ASSERT_TRUE(m_Cache.WriteMetaData("getTitles", "k", "page"));
   ASSERT_TRUE(m_Cache.WriteUserData("u", "1", std::string(151, 'u').c_str()));
   ASSERT_TRUE(m_Cache.WriteWishlistFlag(5, true));  // finds 151 > 150
   EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
   EXPECT_FALSE(HasUser(m_Cache, "u", "1"));
-  bool flag = false;
-  EXPECT_TRUE(m_Cache.ReadWishlistFlag(5, flag));
-  EXPECT_TRUE(flag);
-}
+  EXPECT_EQ(1, Flag(m_Cache, 5));
 
-TEST_P(CacheKinds, NoBudgetNeverEvicts) {
   ASSERT_EQ(0, Open(kAllData, 0));
   for (int i = 0; i < 5; ++i) {
     ASSERT_TRUE(m_Cache.WriteMetaData("a", std::to_string(i).c_str(), std::string(100000, 'x').c_str()));
@@ -207,8 +204,8 @@ TEST_P(CacheKinds, NoBudgetNeverEvicts) {
 TEST_P(CacheKinds, BoxArtRowsKeepValidatorsAndRevalidationMark) {
   ASSERT_EQ(0, Open(kAllData));
   const std::string image("\xff\xd8\xff\0jpeg", 8);
-  ASSERT_TRUE(m_Cache.WriteBoxArt("abc", VL_WS_BOXART_135S, 4321, "Tue, 01 Mar 2011 10:00:00 GMT",
-                                  0, VLString(image.data(), image.size())));
+  ASSERT_TRUE(m_Cache.WriteBoxArt("abc", VL_WS_BOXART_135S, 4321, "Tue, 01 Mar 2011 10:00:00 GMT", 0,
+                                  VLString(image.data(), image.size())));
   unsigned size = 1, needUpdate = 1;
   VLString lastModified("x"), data("x");
   ASSERT_TRUE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_135S, size, lastModified, needUpdate, data));
@@ -249,66 +246,50 @@ TEST_P(CacheKinds, LoadTimeChangeEmptiesServiceOnly) {
 
   EXPECT_TRUE(m_Cache.UpdateLastCacheLoadTime("2011-03-02T10:00:00"));
   EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
-  bool flag = false;
-  EXPECT_TRUE(m_Cache.ReadWishlistFlag(1, flag));
+  EXPECT_EQ(1, Flag(m_Cache, 1));
 
   EXPECT_FALSE(m_Cache.UpdateLastCacheLoadTime(""));
 }
 
 TEST_P(CacheKinds, WishlistFlags) {
   ASSERT_EQ(0, Open(kAllData));
-  bool flag = true;
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(7, flag));
-  EXPECT_FALSE(flag);
-
+  EXPECT_EQ(-1, Flag(m_Cache, 7));
   ASSERT_TRUE(m_Cache.WriteWishlistFlag(7, false));
-  flag = true;
-  EXPECT_TRUE(m_Cache.ReadWishlistFlag(7, flag));
-  EXPECT_FALSE(flag);
+  EXPECT_EQ(0, Flag(m_Cache, 7));
   ASSERT_TRUE(m_Cache.WriteWishlistFlag(-3, true));
-  EXPECT_TRUE(m_Cache.ReadWishlistFlag(-3, flag));
-  EXPECT_TRUE(flag);
+  EXPECT_EQ(1, Flag(m_Cache, -3));
   // A flag is a user-data row under "WishlistFlag" and the title in decimal.
   VLString value;
   EXPECT_TRUE(m_Cache.ReadUserData("WishlistFlag", "-3", value));
   EXPECT_EQ("1", Str(value));
-
   EXPECT_TRUE(m_Cache.RemoveWishlistFlag(7));
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(7, flag));
+  EXPECT_EQ(-1, Flag(m_Cache, 7));
   EXPECT_TRUE(m_Cache.RemoveWishlistFlag(7));  // no row: still done
-}
 
-TEST_P(CacheKinds, WishlistFlagListsMustMatch) {
-  ASSERT_EQ(0, Open(kAllData));
-  VLWS_IntVector ids;
-  VLWS_BoolVector flags;
+  // Lists must be non-empty and of one length.
+  const int32_t titles[] = {1, 2, 3};
+  const bool titleFlags[] = {true, false, true};
+  VLWS_IntVector ids(titles, titles + 3);
+  VLWS_BoolVector flags(titleFlags, titleFlags + 2);
+  EXPECT_FALSE(m_Cache.WriteWishlistFlags(VLWS_IntVector(), VLWS_BoolVector()));
   EXPECT_FALSE(m_Cache.WriteWishlistFlags(ids, flags));
-  ids.push_back(1);
-  ids.push_back(2);
-  ids.push_back(3);
-  flags.push_back(true);
-  flags.push_back(false);
-  EXPECT_FALSE(m_Cache.WriteWishlistFlags(ids, flags));
-  bool flag = false;
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(1, flag));
-
+  EXPECT_EQ(-1, Flag(m_Cache, 1));
   flags.push_back(true);
   ASSERT_TRUE(m_Cache.WriteWishlistFlags(ids, flags));
-  for (int id = 1; id <= 3; ++id) {
-    ASSERT_TRUE(m_Cache.ReadWishlistFlag(id, flag)) << id;
-    EXPECT_EQ(id != 2, flag) << id;
-  }
+  EXPECT_EQ(1, Flag(m_Cache, 1));
+  EXPECT_EQ(0, Flag(m_Cache, 2));
+  EXPECT_EQ(1, Flag(m_Cache, 3));
 }
 
-TEST_P(CacheKinds, PurgeUserDataByName) {
+TEST_P(CacheKinds, PurgeUserDataByNameOrAll) {
+  const char* titleAnswers[] = {"getTitleListing", "getTvEpisodeListing", "getAllTvEpisodeListings"};
   ASSERT_EQ(0, Open(kAllData));
   ASSERT_TRUE(m_Cache.WriteUserData("getWishlistItems", "0,1,20,0", "page"));
   ASSERT_TRUE(m_Cache.WriteUserData("getEmailAddress", "", "mail"));
   ASSERT_TRUE(m_Cache.WriteWishlistFlag(1, true));
-  ASSERT_TRUE(m_Cache.WriteMetaData("getTitleListing", "1", "title"));
-  ASSERT_TRUE(m_Cache.WriteMetaData("getTvEpisodeListing", "2", "episode"));
-  ASSERT_TRUE(m_Cache.WriteMetaData("getAllTvEpisodeListings", "3", "episodes"));
+  for (const char* name : titleAnswers) ASSERT_TRUE(m_Cache.WriteMetaData(name, "1", "title"));
   ASSERT_TRUE(m_Cache.WriteMetaData("getTitles", "1,1,20,2", "page"));
+  ASSERT_TRUE(m_Cache.WriteMetaData("getNavigation", "", "nav"));
 
   // Another name removes only its rows.
   EXPECT_TRUE(m_Cache.PurgeUserData("getWishlistItems"));
@@ -318,25 +299,18 @@ TEST_P(CacheKinds, PurgeUserDataByName) {
 
   // The wishlist flags take the cached title answers with them, which carry the same flags.
   EXPECT_TRUE(m_Cache.RemoveAllWishlistFlags());
-  bool flag = false;
-  EXPECT_FALSE(m_Cache.ReadWishlistFlag(1, flag));
+  EXPECT_EQ(-1, Flag(m_Cache, 1));
   EXPECT_TRUE(HasUser(m_Cache, "getEmailAddress", ""));
-  EXPECT_FALSE(HasMeta(m_Cache, "getTitleListing", "1"));
-  EXPECT_FALSE(HasMeta(m_Cache, "getTvEpisodeListing", "2"));
-  EXPECT_FALSE(HasMeta(m_Cache, "getAllTvEpisodeListings", "3"));
+  for (const char* name : titleAnswers) EXPECT_FALSE(HasMeta(m_Cache, name, "1")) << name;
   EXPECT_TRUE(HasMeta(m_Cache, "getTitles", "1,1,20,2"));
-}
 
-TEST_P(CacheKinds, PurgeOfAllUserData) {
-  ASSERT_EQ(0, Open(kAllData));
-  ASSERT_TRUE(m_Cache.WriteUserData("getEmailAddress", "", "mail"));
+  // So does purging all user data.
   ASSERT_TRUE(m_Cache.WriteWishlistFlag(1, true));
-  ASSERT_TRUE(m_Cache.WriteMetaData("getTitleListing", "1", "title"));
-  ASSERT_TRUE(m_Cache.WriteMetaData("getNavigation", "", "nav"));
+  for (const char* name : titleAnswers) ASSERT_TRUE(m_Cache.WriteMetaData(name, "1", "title"));
   EXPECT_TRUE(m_Cache.PurgeUserData(""));
   EXPECT_FALSE(HasUser(m_Cache, "getEmailAddress", ""));
   EXPECT_FALSE(HasUser(m_Cache, "WishlistFlag", "1"));
-  EXPECT_FALSE(HasMeta(m_Cache, "getTitleListing", "1"));
+  for (const char* name : titleAnswers) EXPECT_FALSE(HasMeta(m_Cache, name, "1")) << name;
   EXPECT_TRUE(HasMeta(m_Cache, "getNavigation", ""));
 
   // Without metadata caching the title answers are not touched (nor readable).
@@ -351,25 +325,11 @@ TEST_P(CacheKinds, PurgeOfAllUserData) {
 
 // ---- Cache types ---------------------------------------------------------------------------------
 
-TEST(CacheTypes, TypeZeroOpensAndCachesNothing) {
+TEST(CacheTypes, TypeZeroOpensAndCachesNothingAndAnUnknownTypeDoesNotOpen) {
   CacheMgr cache;
   EXPECT_EQ(0, cache.Open(Params(0, kAllData, 0)));
-  VLString value("x");
-  EXPECT_FALSE(cache.WriteMetaData("n", "k", "v"));
-  EXPECT_FALSE(cache.ReadMetaData("n", "k", value));
-  EXPECT_EQ("", Str(value));
-  EXPECT_FALSE(cache.UpdateLastCacheLoadTime("t"));
-  EXPECT_FALSE(cache.WriteBoxArt("p", VL_WS_BOXART_95, 1, "", 0, "d"));
-  EXPECT_FALSE(cache.SetBoxArtNeedUpdate());
-  EXPECT_FALSE(cache.WriteUserData("n", "k", "v"));
-  EXPECT_FALSE(cache.PurgeUserData(""));
-  EXPECT_FALSE(cache.WriteWishlistFlag(1, true));
-  EXPECT_FALSE(cache.RemoveWishlistFlag(1));
+  ExpectOnlyKinds(cache, 0);
   EXPECT_EQ(0, cache.Close());
-}
-
-TEST(CacheTypes, UnknownTypeDoesNotOpen) {
-  CacheMgr cache;
   EXPECT_NE(0, cache.Open(Params(3, kAllData, 0)));
   EXPECT_FALSE(cache.WriteMetaData("n", "k", "v"));
 }
@@ -448,6 +408,7 @@ TEST(CacheTypes, ExecuteSQLReadsTheFirstColumnOfTheFirstRow) {
 TEST(BoxArtEviction, RemovesEverySizeOfTheOldestTitlesWithTheirFiles) {
   VLTestDir dir;
   std::string path = dir / "c.vl";
+  auto exists = [&](const std::string& name) { return VLFile::Exist((dir / name).c_str()); };
   CacheMgr cache;
   ASSERT_EQ(0, cache.Open(Params(kFile, 2, 1000, path)));
   ASSERT_EQ(1000u, cache.BoxArtLimit());
@@ -464,25 +425,21 @@ TEST(BoxArtEviction, RemovesEverySizeOfTheOldestTitlesWithTheirFiles) {
 
   // 11 * 90 + 10 = 1000: not above the budget, so this write evicts nothing.
   ASSERT_TRUE(cache.WriteBoxArt("new", VL_WS_BOXART_95, 5, "", 0, ""));
-  unsigned size, needUpdate;
-  VLString lastModified, data;
-  EXPECT_TRUE(cache.ReadBoxArt("t0", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_TRUE(HasBoxArt(cache, "t0", VL_WS_BOXART_95));
 
   // 1005 is above: t0 to t9 go, t10 and the new image stay.
   ASSERT_TRUE(cache.WriteBoxArt("newer", VL_WS_BOXART_95, 5, "", 0, ""));
   for (int i = 0; i <= 9; ++i) {
     std::string prefix = "t" + std::to_string(i);
-    EXPECT_FALSE(cache.ReadBoxArt(prefix.c_str(), VL_WS_BOXART_95, size, lastModified,
-                                  needUpdate, data))
-        << prefix;
-    EXPECT_FALSE(VLFile::Exist((dir / (prefix + "95.jpg")).c_str())) << prefix;
+    EXPECT_FALSE(HasBoxArt(cache, prefix, VL_WS_BOXART_95)) << prefix;
+    EXPECT_FALSE(exists(prefix + "95.jpg")) << prefix;
   }
-  EXPECT_FALSE(cache.ReadBoxArt("t0", VL_WS_BOXART_135S, size, lastModified, needUpdate, data));
-  EXPECT_FALSE(VLFile::Exist((dir / "t0135.jpg").c_str()));
-  EXPECT_TRUE(cache.ReadBoxArt("t10", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
-  EXPECT_TRUE(VLFile::Exist((dir / "t1095.jpg").c_str()));
-  EXPECT_TRUE(cache.ReadBoxArt("new", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
-  EXPECT_TRUE(cache.ReadBoxArt("newer", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_FALSE(HasBoxArt(cache, "t0", VL_WS_BOXART_135S));
+  EXPECT_FALSE(exists("t0135.jpg"));
+  EXPECT_TRUE(HasBoxArt(cache, "t10", VL_WS_BOXART_95));
+  EXPECT_TRUE(exists("t1095.jpg"));
+  EXPECT_TRUE(HasBoxArt(cache, "new", VL_WS_BOXART_95));
+  EXPECT_TRUE(HasBoxArt(cache, "newer", VL_WS_BOXART_95));
 }
 
 TEST(BoxArtEviction, MemoryCacheEvictsRowsOnly) {
@@ -492,10 +449,8 @@ TEST(BoxArtEviction, MemoryCacheEvictsRowsOnly) {
   ASSERT_TRUE(VLWriteFile(dir / "a95.jpg", "img"));
   ASSERT_TRUE(cache.WriteBoxArt("a", VL_WS_BOXART_95, 1001, "", 0, "bytes"));
   ASSERT_TRUE(cache.WriteBoxArt("b", VL_WS_BOXART_95, 1, "", 0, "bytes"));
-  unsigned size, needUpdate;
-  VLString lastModified, data;
-  EXPECT_FALSE(cache.ReadBoxArt("a", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
-  EXPECT_TRUE(cache.ReadBoxArt("b", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
+  EXPECT_FALSE(HasBoxArt(cache, "a", VL_WS_BOXART_95));
+  EXPECT_TRUE(HasBoxArt(cache, "b", VL_WS_BOXART_95));
   EXPECT_TRUE(VLFile::Exist((dir / "a95.jpg").c_str()));
 }
 
@@ -509,6 +464,7 @@ TEST(CacheSharing, TwoObjectsOnOneFileFromTwoThreadsLoseNothing) {
   const std::string path = dir / "shared.vl";
   const int kRounds = 400;
   int failures[2] = {0, 0};
+  auto key = [](int thread, int i) { return std::to_string(thread) + "," + std::to_string(i); };
 
   auto work = [&](int thread) {
     CacheMgr cache;
@@ -517,24 +473,18 @@ TEST(CacheSharing, TwoObjectsOnOneFileFromTwoThreadsLoseNothing) {
       return;
     }
     for (int i = 0; i < kRounds; ++i) {
-      std::string key = std::to_string(thread) + "," + std::to_string(i);
-      VLString value;
+      const std::string k = key(thread, i), page = "page " + k;
+      const int title = thread * 100000 + i;
+      VLString value, lastModified, data;
       bool flag = false;
       unsigned size = 0, needUpdate = 0;
-      VLString lastModified, data;
-      int title = thread * 100000 + i;
-      if (!cache.WriteMetaData("getTitles", key.c_str(), ("page " + key).c_str())) ++failures[thread];
-      if (!cache.ReadMetaData("getTitles", key.c_str(), value) || Str(value) != "page " + key) {
-        ++failures[thread];
-      }
-      if (!cache.WriteWishlistFlag(title, true)) ++failures[thread];
-      if (!cache.ReadWishlistFlag(title, flag) || !flag) ++failures[thread];
-      if (!cache.WriteBoxArt(key.c_str(), VL_WS_BOXART_95, i, "lm", 0, "")) ++failures[thread];
-      if (!cache.ReadBoxArt(key.c_str(), VL_WS_BOXART_95, size, lastModified, needUpdate, data) ||
-          size != static_cast<unsigned>(i)) {
-        ++failures[thread];
-      }
-      if (!cache.SetBoxArtNeedUpdate()) ++failures[thread];
+      bool ok = cache.WriteMetaData("getTitles", k.c_str(), page.c_str()) &&
+                cache.ReadMetaData("getTitles", k.c_str(), value) && Str(value) == page &&
+                cache.WriteWishlistFlag(title, true) && cache.ReadWishlistFlag(title, flag) && flag &&
+                cache.WriteBoxArt(k.c_str(), VL_WS_BOXART_95, i, "lm", 0, "") &&
+                cache.ReadBoxArt(k.c_str(), VL_WS_BOXART_95, size, lastModified, needUpdate, data) &&
+                size == static_cast<unsigned>(i) && cache.SetBoxArtNeedUpdate();
+      if (!ok) ++failures[thread];
     }
   };
   std::thread first(work, 0), second(work, 1);
@@ -548,10 +498,8 @@ TEST(CacheSharing, TwoObjectsOnOneFileFromTwoThreadsLoseNothing) {
   ASSERT_EQ(0, check.Open(Params(kFile, kAllData, 0, path)));
   for (int thread = 0; thread < 2; ++thread) {
     for (int i = 0; i < kRounds; ++i) {
-      std::string key = std::to_string(thread) + "," + std::to_string(i);
-      bool flag = false;
-      EXPECT_TRUE(HasMeta(check, "getTitles", key.c_str())) << key;
-      EXPECT_TRUE(check.ReadWishlistFlag(thread * 100000 + i, flag)) << key;
+      EXPECT_TRUE(HasMeta(check, "getTitles", key(thread, i).c_str())) << key(thread, i);
+      EXPECT_EQ(1, Flag(check, thread * 100000 + i)) << key(thread, i);
     }
   }
 }

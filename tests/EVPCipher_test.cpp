@@ -47,28 +47,24 @@ TEST(EVPCipher, TextEncoding) {
   EXPECT_FALSE(EVPCipher::SimpleDecode(VLString("0\0", 2), out, n));
 }
 
-TEST(EVPCipher, PinnedCipherTexts) {
-  // printf 'Hello, settings!' |
-  //   openssl enc -aes-128-cbc -K <key> -iv 00112233041526378091a2b38495a6b7
-  EVPCipher aes(EVPCipher::AES_128_CBC);
-  EXPECT_EQ("f5428afa08589ad17e94d42d83a2e98f73f3b8d9cb139bfbbcc07cde67973e04",
-            Str(aes.Encrypt("Hello, settings!", kPassword)));
-  EXPECT_EQ("Hello, settings!",
-            Str(aes.Decrypt("f5428afa08589ad17e94d42d83a2e98f73f3b8d9cb139bfbbcc07cde67973e04",
-                            kPassword)));
-  // ... | openssl enc -bf-cbc -provider legacy -provider default -K <key> -iv 0011223304152637
-  EVPCipher blowfish(EVPCipher::BLOWFISH_CBC);
-  EXPECT_EQ("ab2c0cfbedd44c27d7d993fbb97ad3ab2d657df3afa73c9c",
-            Str(blowfish.Encrypt("Hello, settings!", kPassword)));
-  EXPECT_EQ("Hello, settings!",
-            Str(blowfish.Decrypt("ab2c0cfbedd44c27d7d993fbb97ad3ab2d657df3afa73c9c", kPassword)));
-}
-
 // Blowfish comes from a library context of the cipher's own: the host process's OpenSSL still
-// has no legacy provider.
-TEST(EVPCipher, BlowfishLeavesTheHostsOpenSSLAlone) {
-  EVPCipher blowfish(EVPCipher::BLOWFISH_CBC);
-  ASSERT_FALSE(blowfish.Encrypt("x", kPassword).empty());
+// has no legacy provider afterwards.
+TEST(EVPCipher, PinnedCipherTextsAndTheHostsOpenSSLLeftAlone) {
+  const struct {
+    EVPCipher::ALGO algo;
+    const char* encrypted;
+  } pinned[] = {
+      // printf 'Hello, settings!' |
+      //   openssl enc -aes-128-cbc -K <key> -iv 00112233041526378091a2b38495a6b7
+      {EVPCipher::AES_128_CBC, "f5428afa08589ad17e94d42d83a2e98f73f3b8d9cb139bfbbcc07cde67973e04"},
+      // ... | openssl enc -bf-cbc -provider legacy -provider default -K <key> -iv 0011223304152637
+      {EVPCipher::BLOWFISH_CBC, "ab2c0cfbedd44c27d7d993fbb97ad3ab2d657df3afa73c9c"},
+  };
+  for (const auto& p : pinned) {
+    EVPCipher cipher(p.algo);
+    EXPECT_EQ(p.encrypted, Str(cipher.Encrypt("Hello, settings!", kPassword)));
+    EXPECT_EQ("Hello, settings!", Str(cipher.Decrypt(p.encrypted, kPassword)));
+  }
   EVP_CIPHER* global = EVP_CIPHER_fetch(NULL, "BF-CBC", NULL);
   EXPECT_EQ(nullptr, global);
   EVP_CIPHER_free(global);
@@ -117,11 +113,11 @@ TEST(EVPCipher, BadInputGivesEmptyText) {
   VLString encrypted = cipher.Encrypt("value", kPassword);
   ASSERT_EQ(32u, encrypted.length());
 
-  EXPECT_FALSE(cipher.GenerateKeyIV(""));
-  EXPECT_FALSE(cipher.GenerateKeyIV("0011223344556677"));                    // too short
-  EXPECT_FALSE(cipher.GenerateKeyIV("00112233445566778899aabbccddeeff00"));  // too long
-  EXPECT_FALSE(cipher.GenerateKeyIV("00112233445566778899aabbccddeefX"));    // outside alphabet
-  EXPECT_FALSE(cipher.GenerateKeyIV("00112233445566778899aabbccddeef"));     // odd
+  // Empty, too short, too long, outside the alphabet, odd.
+  for (const char* bad : {"", "0011223344556677", "00112233445566778899aabbccddeeff00",
+                          "00112233445566778899aabbccddeefX", "00112233445566778899aabbccddeef"}) {
+    EXPECT_FALSE(cipher.GenerateKeyIV(bad)) << bad;
+  }
 
   EXPECT_TRUE(cipher.Encrypt("", kPassword).empty());
   EXPECT_TRUE(cipher.Encrypt("value", "").empty());

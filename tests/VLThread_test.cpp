@@ -12,8 +12,10 @@
 
 namespace {
 
-// The work of one thread: a short pause (so that the wait often has to wait), then the mark.
+// The work of one thread: it waits while the job is closed, then a short pause (so that the
+// wait often has to wait), then the mark.
 struct Job {
+  std::atomic<bool> open{true};
   std::atomic<bool> started{false};
   std::atomic<bool> finished{false};
   unsigned long pauseMs = 0;
@@ -22,22 +24,16 @@ struct Job {
 void DoJob(void* arg) {
   Job* job = static_cast<Job*>(arg);
   job->started = true;
+  while (!job->open) VLThread::Sleep(1);
   VLThread::Sleep(job->pauseMs);
   job->finished = true;
 }
 
-TEST(VLThread, NeverStartedThreadIsNotRunning) {
-  VLThread* t = VLThread::CreateThread();
-  EXPECT_FALSE(t->IsRunning());
-  t->WaitUntilCompletion();  // returns at once
-  VLThread::DestroyThread(t);
-  VLThread::DestroyThread(nullptr);
-}
-
+// Several owners at once, each starting and waiting for one short thread after another. The
+// running flag is up before Run returns, so a thread is running or done right after Run.
 TEST(VLThread, WaitRightAfterRunNeverReturnsEarly) {
-  // Several owners at once, each starting and waiting for one short thread after another.
-  const int kOwners = 4, kRunsEach = 12;
-  std::atomic<int> early{0}, stillRunning{0}, notStarted{0};
+  const int kOwners = 4, kRunsEach = 16;
+  std::atomic<int> early{0}, stillRunning{0}, notStarted{0}, notYetRunning{0};
   std::vector<std::thread> owners;
   for (int o = 0; o < kOwners; ++o) {
     owners.emplace_back([&, o] {
@@ -48,6 +44,7 @@ TEST(VLThread, WaitRightAfterRunNeverReturnsEarly) {
         if (!t->Run("job", DoJob, &job)) {
           ++notStarted;
         } else {
+          if (!t->IsRunning() && !job.finished) ++notYetRunning;
           t->WaitUntilCompletion();
           if (!job.finished) ++early;
           if (t->IsRunning()) ++stillRunning;
@@ -58,26 +55,9 @@ TEST(VLThread, WaitRightAfterRunNeverReturnsEarly) {
   }
   for (std::thread& owner : owners) owner.join();
   EXPECT_EQ(0, notStarted.load());
+  EXPECT_EQ(0, notYetRunning.load());
   EXPECT_EQ(0, early.load());
   EXPECT_EQ(0, stillRunning.load());
-}
-
-TEST(VLThread, ManyThreadsAtOnce) {
-  const int kThreads = 64;
-  std::vector<Job> jobs(kThreads);
-  std::vector<VLThread*> threads;
-  for (Job& job : jobs) {
-    job.pauseMs = 1;
-    threads.push_back(VLThread::CreateThread());
-    ASSERT_TRUE(threads.back()->Run(nullptr, DoJob, &job));
-    EXPECT_TRUE(threads.back()->IsRunning() || job.finished);
-  }
-  for (int i = 0; i < kThreads; ++i) {
-    threads[i]->WaitUntilCompletion();
-    EXPECT_TRUE(jobs[i].finished) << i;
-    EXPECT_FALSE(threads[i]->IsRunning());
-    VLThread::DestroyThread(threads[i]);
-  }
 }
 
 // Makes thread creation fail for the scope: no default stack of this size can be mapped.
@@ -100,9 +80,11 @@ class ImpossibleStacks {
   pthread_attr_t m_Saved;
 };
 
-TEST(VLThread, FailedCreationLeavesTheObjectIdle) {
+TEST(VLThread, NeverStartedOrFailedThreadIsIdle) {
   Job job;
   VLThread* t = VLThread::CreateThread();
+  EXPECT_FALSE(t->IsRunning());
+  t->WaitUntilCompletion();  // returns at once
   {
     ImpossibleStacks noThreads;
     ASSERT_FALSE(t->Run("job", DoJob, &job));
@@ -119,28 +101,18 @@ TEST(VLThread, FailedCreationLeavesTheObjectIdle) {
   EXPECT_FALSE(noFunction->Run("none", nullptr, nullptr));
   EXPECT_FALSE(noFunction->IsRunning());
   VLThread::DestroyThread(noFunction);
-}
-
-// The function blocks until released.
-struct Gate {
-  std::atomic<bool> open{false};
-  std::atomic<bool> passed{false};
-};
-
-void WaitAtGate(void* arg) {
-  Gate* gate = static_cast<Gate*>(arg);
-  while (!gate->open) VLThread::Sleep(1);
-  gate->passed = true;
+  VLThread::DestroyThread(nullptr);
 }
 
 TEST(VLThread, DestroyingARunningThreadLeavesItsRecordToTheThread) {
-  Gate gate;
+  Job job;
+  job.open = false;
   VLThread* t = VLThread::CreateThread();
-  ASSERT_TRUE(t->Run("gate", WaitAtGate, &gate));
+  ASSERT_TRUE(t->Run("closed", DoJob, &job));
   EXPECT_TRUE(t->IsRunning());
   VLThread::DestroyThread(t);  // the thread still writes its flag when it ends
-  gate.open = true;
-  while (!gate.passed) VLThread::Sleep(1);
+  job.open = true;
+  while (!job.finished) VLThread::Sleep(1);
   VLThread::Sleep(20);  // let it finish its last write (checked by the sanitizer build)
 }
 

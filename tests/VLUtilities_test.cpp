@@ -47,14 +47,12 @@ TEST(VLUtilities, AutoCharPtrOwnsStrDupTexts) {
 }
 
 TEST(VLUtilities, TextConversions) {
-  EXPECT_TRUE(VLUtilities::Str2Bool("true"));
-  EXPECT_TRUE(VLUtilities::Str2Bool("TRUE"));
-  EXPECT_TRUE(VLUtilities::Str2Bool("True"));
-  EXPECT_FALSE(VLUtilities::Str2Bool("1"));
-  EXPECT_FALSE(VLUtilities::Str2Bool("yes"));
-  EXPECT_FALSE(VLUtilities::Str2Bool("true "));
-  EXPECT_FALSE(VLUtilities::Str2Bool(""));
-  EXPECT_FALSE(VLUtilities::Str2Bool(nullptr));
+  const struct {
+    const char* text;
+    bool value;
+  } bools[] = {{"true", true}, {"TRUE", true}, {"True", true}, {"1", false},
+               {"yes", false}, {"true ", false}, {"", false},   {nullptr, false}};
+  for (const auto& b : bools) EXPECT_EQ(b.value, VLUtilities::Str2Bool(b.text)) << (b.text ? b.text : "null");
 
   for (int order = 0; order < 4; ++order)
     EXPECT_EQ(order, VLUtilities::SortOrder2Int(static_cast<VL_WS_SortOrder>(order)));

@@ -38,17 +38,20 @@ std::vector<int> ActiveAreas() {
 }
 
 TEST_F(VLWSAELogTest, MaskActivatesExactlyItsAreas) {
-  EXPECT_EQ(0, VLWSAELog::InitWSLogs(256, 1, ""));
-  EXPECT_EQ(std::vector<int>({1, 0, 0, 0, 0, 0}), ActiveAreas());
-  EXPECT_EQ(0, VLWSAELog::InitWSLogs(16128, 1, ""));
-  EXPECT_EQ(std::vector<int>({1, 1, 1, 1, 1, 1}), ActiveAreas());
-  EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x800 | 0x2000 | 0x1, 1, ""));
-  EXPECT_EQ(std::vector<int>({0, 0, 0, 1, 0, 1}), ActiveAreas());
-  EXPECT_EQ(0, VLWSAELog::InitWSLogs(0, 1, ""));
-  EXPECT_EQ(std::vector<int>({0, 0, 0, 0, 0, 0}), ActiveAreas());
+  const struct {
+    unsigned mask;
+    std::vector<int> active;
+  } rows[] = {{256, {1, 0, 0, 0, 0, 0}},
+              {16128, {1, 1, 1, 1, 1, 1}},
+              {0x800 | 0x2000 | 0x1, {0, 0, 0, 1, 0, 1}},
+              {0, {0, 0, 0, 0, 0, 0}}};
+  for (const auto& row : rows) {
+    EXPECT_EQ(0, VLWSAELog::InitWSLogs(row.mask, 1, "")) << row.mask;
+    EXPECT_EQ(row.active, ActiveAreas()) << row.mask;
+  }
 }
 
-TEST_F(VLWSAELogTest, FileTargetInTheGivenDirectory) {
+TEST_F(VLWSAELogTest, FileTargetInTheGivenOrCurrentDirectory) {
   VLTestDir dir;
   EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x100, 2, dir.path().c_str()));
   VL_LogOutput(VLWSAELog::m_areainfos[0].id, 1, "into the file");
@@ -58,67 +61,53 @@ TEST_F(VLWSAELogTest, FileTargetInTheGivenDirectory) {
   EXPECT_EQ(1, VLWSAELog::InitWSLogs(0x200, 0, ""));
   EXPECT_EQ(std::vector<int>({0, 1, 0, 0, 0, 0}), ActiveAreas());
   VL_LogOutput(VLWSAELog::m_areainfos[1].id, 4, "still the file");
-  EXPECT_EQ("[VL_WSAE:1] into the file\n[VL_WSCFGAE:4] still the file\n", VLReadFile(dir / "log.txt"));
+  const std::string written = "[VL_WSAE:1] into the file\n[VL_WSCFGAE:4] still the file\n";
+  EXPECT_EQ(written, VLReadFile(dir / "log.txt"));
 
   // Bit 0 wins over bit 1: the console.
   EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x200, 3, dir.path().c_str()));
   VL_LogOutput(VLWSAELog::m_areainfos[1].id, 4, "to the console");
-  EXPECT_EQ("[VL_WSAE:1] into the file\n[VL_WSCFGAE:4] still the file\n", VLReadFile(dir / "log.txt"));
-}
+  EXPECT_EQ(written, VLReadFile(dir / "log.txt"));
 
-TEST_F(VLWSAELogTest, EmptyDirectoryMeansTheCurrentOne) {
-  VLTestDir dir;
+  EXPECT_EQ(2, VLWSAELog::InitWSLogs(0x100, 2, (dir.path() + "missing/").c_str()));
+
+  // An empty or missing directory means the current one.
+  VLTestDir current;
   {
-    VLScopedCurrentDir inside(dir.path());
+    VLScopedCurrentDir inside(current.path());
     EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x400, 2, ""));
     VL_LogOutput(VLWSAELog::m_areainfos[2].id, 8, "here");
     EXPECT_EQ(0, VLWSAELog::InitWSLogs(0x400, 2, nullptr));
     VL_LogOutput(VLWSAELog::m_areainfos[2].id, 8, "again");
   }
-  EXPECT_EQ("[soap_proxy:8] here\n[soap_proxy:8] again\n", VLReadFile(dir / "log.txt"));
+  EXPECT_EQ("[soap_proxy:8] here\n[soap_proxy:8] again\n", VLReadFile(current / "log.txt"));
 }
 
-TEST_F(VLWSAELogTest, UnopenableLogFileReturnsTwo) {
-  VLTestDir dir;
-  EXPECT_EQ(2, VLWSAELog::InitWSLogs(0x100, 2, (dir.path() + "missing/").c_str()));
-}
-
-TEST_F(VLWSAELogTest, ScopeTraceAndLazyArea) {
+TEST_F(VLWSAELogTest, ScopeTraceLazyAreaAndBoundedFormatting) {
   static VLLogArea s_Log(VLWSAELOG_AREA_NAME);
   int id = s_Log.Id();
   int registered = -1;
   ASSERT_EQ(0, VL_LogRegisterArea("VL_WSAE", &registered));
   EXPECT_EQ(registered, id);
   EXPECT_EQ(id, s_Log.Id());
+  VLLogArea broken(nullptr);  // cannot register: stays unusable
+  EXPECT_EQ(-1, broken.Id());
+  EXPECT_EQ(-1, broken.Id());
 
   VLWSAELog::InitWSLogs(0x100, 1, "");
   CapturedLog log;
   {
-    VLWSAELog trace("DUDUVudAE", "getTitles", s_Log.Id());
-    VLLogOutputwithConfig({s_Log.Id(), 8}, "genre %d", 12);
+    VLWSAELog trace("DUDUVudAE", "getTitles", id);
+    VLLogOutputwithConfig({id, 8}, "genre %d", 12);
   }
-  EXPECT_EQ(std::vector<std::string>({"VL_WSAE:4:Entering DUDUVudAE::getTitles",
-                                      "VL_WSAE:8:genre 12", "VL_WSAE:4:Exiting DUDUVudAE::getTitles"}),
-            log.lines);
-}
-
-TEST_F(VLWSAELogTest, AreaThatCannotRegisterStaysUnusable) {
-  VLLogArea broken(nullptr);
-  EXPECT_EQ(-1, broken.Id());
-  EXPECT_EQ(-1, broken.Id());
-}
-
-TEST_F(VLWSAELogTest, FormattedMessageIsCutAndNotFormattedAgain) {
-  VLWSAELog::InitWSLogs(0x100, 1, "");
-  int id = VLWSAELog::m_areainfos[0].id;
-  CapturedLog log;
+  // A formatted message is cut at 511 characters and not formatted again.
   VLLogOutputwithConfig({id, 4}, "url %s", "a%20b%s%n");
-  std::string longText(600, 'x');
-  VLLogOutputwithConfig({id, 1}, "%s", longText.c_str());
+  VLLogOutputwithConfig({id, 1}, "%s", std::string(600, 'x').c_str());
   VLLogOutputwithConfig({VLWSAELog::m_areainfos[1].id, 1}, "inactive area");
-  ASSERT_EQ(2u, log.lines.size());
-  EXPECT_EQ("VL_WSAE:4:url a%20b%s%n", log.lines[0]);
-  EXPECT_EQ("VL_WSAE:1:" + std::string(511, 'x'), log.lines[1]);
+  EXPECT_EQ(std::vector<std::string>({"VL_WSAE:4:Entering DUDUVudAE::getTitles", "VL_WSAE:8:genre 12",
+                                      "VL_WSAE:4:Exiting DUDUVudAE::getTitles", "VL_WSAE:4:url a%20b%s%n",
+                                      "VL_WSAE:1:" + std::string(511, 'x')}),
+            log.lines);
 }
 
 TEST_F(VLWSAELogTest, SoapAreasRegisterOnce) {

@@ -36,29 +36,19 @@ class Lifecycle : public testing::Test {
     VL_PlatformResetServices();
   }
 
-  // Runs the whole lifecycle with launcher, returning what it printed.
-  std::string RunLifecycle(scLauncher::ILauncher* with) {
+  // Runs the whole lifecycle with launcher, calling onTerminate terminations times; returns what
+  // it printed, and in *first how long the first onTerminate took.
+  static std::string RunLifecycle(scLauncher::ILauncher* with, int terminations = 1,
+                                  std::chrono::steady_clock::duration* first = nullptr) {
     testing::internal::CaptureStdout();
     scLauncher::IApplication2* app = createApplication2();
     app->init(with);
-    app->onTerminate();
-    delete app;
-    return testing::internal::GetCapturedStdout();
-  }
-
-  // An initialised application that is terminated times times; returns how long the first
-  // onTerminate took, and in *out what the whole lifecycle printed.
-  std::chrono::steady_clock::duration TimedTermination(int times, std::string* out) {
-    testing::internal::CaptureStdout();
-    scLauncher::IApplication2* app = createApplication2();
-    app->init(&launcher);
     auto start = std::chrono::steady_clock::now();
     app->onTerminate();
-    auto elapsed = std::chrono::steady_clock::now() - start;
-    for (int i = 1; i < times; ++i) app->onTerminate();
+    if (first) *first = std::chrono::steady_clock::now() - start;
+    for (int i = 1; i < terminations; ++i) app->onTerminate();
     delete app;
-    *out = testing::internal::GetCapturedStdout();
-    return elapsed;
+    return testing::internal::GetCapturedStdout();
   }
 
   vlplatform::Stage stage;
@@ -92,8 +82,9 @@ TEST_F(Lifecycle, WithoutAStageNothingStartsAndNoKeyIsSent) {
 }
 
 TEST_F(Lifecycle, OnTerminateSendsTheTerminateKeyWithoutPauseWhenSpFlagIsZero) {
-  std::string out;
-  EXPECT_LT(TimedTermination(2, &out), std::chrono::milliseconds(800));
+  std::chrono::steady_clock::duration first;
+  std::string out = RunLifecycle(&launcher, 2, &first);
+  EXPECT_LT(first, std::chrono::milliseconds(800));
   EXPECT_EQ(std::string::npos, out.find("In Sleep FUNCTION"));
   ASSERT_EQ(4u, stage.Keys().size());  // onTerminate may be called again: it sends the keys again
   for (size_t i = 0; i < 4; ++i) {
@@ -105,8 +96,9 @@ TEST_F(Lifecycle, OnTerminateSendsTheTerminateKeyWithoutPauseWhenSpFlagIsZero) {
 
 TEST_F(Lifecycle, OnTerminateWithSpFlagSendsItsKeyAndPausesFirst) {
   sp_flag = 1;
-  std::string out;
-  EXPECT_GE(TimedTermination(1, &out), std::chrono::milliseconds(800));
+  std::chrono::steady_clock::duration first;
+  std::string out = RunLifecycle(&launcher, 1, &first);
+  EXPECT_GE(first, std::chrono::milliseconds(800));
   EXPECT_NE(std::string::npos,
             out.find("\n[VL_FLASH] Now send  AEKEY_TERMINATEANIMATION \nIn Sleep FUNCTION, delay time is :800 ms\n"));
   ASSERT_EQ(4u, stage.Keys().size());

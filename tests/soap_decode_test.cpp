@@ -55,8 +55,11 @@ class SoapDecode : public ::testing::Test {
     soap_end(&m_Rtb);
   }
 
-  // getTitlesByNavigation answered with the given result element content.
+  // getTitlesByNavigation answered with the given response element content; what an earlier call
+  // left in the context is released first.
   int GetTitles(const std::string& responseContent, _VL1__getTitlesByNavigationResponse** response) {
+    soap_destroy(&m_Rtb);
+    soap_end(&m_Rtb);
     m_Server.SetReply(VLTestServer::HttpReply(VLTestServer::Envelope(
         "<VL1:getTitlesByNavigationResponse>" + responseContent + "</VL1:getTitlesByNavigationResponse>")));
     EXPECT_EQ(SOAP_OK, m_Rtb.Setup("getTitlesByNavigation"));
@@ -69,30 +72,26 @@ class SoapDecode : public ::testing::Test {
   RealTimeBrowse m_Rtb;
 };
 
-std::string Listing(const std::string& inner) { return "<VL1:TitleListing>" + inner + "</VL1:TitleListing>"; }
+// A result element whose page holds one title listing with inner.
+std::string OneListing(const std::string& inner) {
+  return "<VL1:getTitlesByNavigationResult><VL1:Titles><VL1:TitleListing>" + inner +
+         "</VL1:TitleListing></VL1:Titles></VL1:getTitlesByNavigationResult>";
+}
 
 }  // namespace
 
 TEST_F(SoapDecode, TitleListingToleratesUnknownAndMissingElements) {
   LogCapture log;
   _VL1__getTitlesByNavigationResponse* r;
-  ASSERT_EQ(SOAP_OK, GetTitles("<VL1:getTitlesByNavigationResult><VL1:ResponseCode>0</VL1:ResponseCode>"
-                               "<VL1:ResponseMessage>OK</VL1:ResponseMessage><VL1:TotalItems>1</VL1:TotalItems>"
-                               "<VL1:Titles>" +
-                                   Listing("<VL1:TitleName>Heat</VL1:TitleName><VL1:Surprise><x>1</x></VL1:Surprise>"
-                                           "<VL1:TitleID>42</VL1:TitleID><VL1:IsTvListing>true</VL1:IsTvListing>"
-                                           "<VL1:AvailableProducts><VL1:ProductListing><VL1:Price>9.99</VL1:Price>"
-                                           "<VL1:PurchaseType>any</VL1:PurchaseType></VL1:ProductListing>"
-                                           "</VL1:AvailableProducts>") +
-                                   "</VL1:Titles></VL1:getTitlesByNavigationResult>",
+  ASSERT_EQ(SOAP_OK, GetTitles(OneListing("<VL1:TitleName>Heat</VL1:TitleName><VL1:Surprise><x>1</x></VL1:Surprise>"
+                                          "<VL1:TitleID>42</VL1:TitleID><VL1:IsTvListing>true</VL1:IsTvListing>"
+                                          "<VL1:AvailableProducts><VL1:ProductListing><VL1:Price>9.99</VL1:Price>"
+                                          "<VL1:PurchaseType>any</VL1:PurchaseType></VL1:ProductListing>"
+                                          "</VL1:AvailableProducts>"),
                                &r));
-  VL1__GetTitlesResponse* result = r->getTitlesByNavigationResult;
-  ASSERT_NE(nullptr, result);
-  EXPECT_STREQ("OK", result->ResponseMessage);
-  EXPECT_EQ(1, result->TotalItems);
-  ASSERT_NE(nullptr, result->Titles);
-  ASSERT_EQ(1, result->Titles->__sizeTitleListing);
-  VL1__TitleListing* t = result->Titles->TitleListing[0];
+  ASSERT_NE(nullptr, r->getTitlesByNavigationResult->Titles);
+  ASSERT_EQ(1, r->getTitlesByNavigationResult->Titles->__sizeTitleListing);
+  VL1__TitleListing* t = r->getTitlesByNavigationResult->Titles->TitleListing[0];
   EXPECT_EQ(42, t->TitleID);
   EXPECT_STREQ("Heat", t->TitleName);
   EXPECT_EQ(0, t->TitlePosition);
@@ -107,34 +106,37 @@ TEST_F(SoapDecode, TitleListingToleratesUnknownAndMissingElements) {
 
 TEST_F(SoapDecode, EnumerationsByNameOrNumberAndUnknownNameIsTypeError) {
   auto assets = [](const std::string& items) {
-    return "<VL1:getTitlesByNavigationResult><VL1:Titles>" +
-           Listing("<VL1:AvailableProducts><VL1:ProductListing><VL1:AvailableAssets>" + items +
-                   "</VL1:AvailableAssets></VL1:ProductListing></VL1:AvailableProducts>") +
-           "</VL1:Titles></VL1:getTitlesByNavigationResult>";
+    return OneListing("<VL1:AvailableProducts><VL1:ProductListing><VL1:AvailableAssets>" + items +
+                      "</VL1:AvailableAssets></VL1:ProductListing></VL1:AvailableProducts>");
   };
   _VL1__getTitlesByNavigationResponse* r;
-  ASSERT_EQ(SOAP_OK, GetTitles(assets("<VL1:FileProfile>HIGH_DEFINITION</VL1:FileProfile><VL1:FileProfile>7</VL1:FileProfile>"), &r));
-  VL1__ArrayOfFileProfile* profiles = r->getTitlesByNavigationResult->Titles->TitleListing[0]->AvailableProducts->ProductListing[0]->AvailableAssets;
+  ASSERT_EQ(SOAP_OK, GetTitles(assets("<VL1:FileProfile>HIGH_DEFINITION</VL1:FileProfile>"
+                                      "<VL1:FileProfile>7</VL1:FileProfile>"),
+                               &r));
+  VL1__ArrayOfFileProfile* profiles =
+      r->getTitlesByNavigationResult->Titles->TitleListing[0]->AvailableProducts->ProductListing[0]->AvailableAssets;
   ASSERT_EQ(2, profiles->__sizeFileProfile);
   EXPECT_EQ(2, profiles->FileProfile[0]);
   EXPECT_EQ(7, profiles->FileProfile[1]);
-  soap_destroy(&m_Rtb);
-  soap_end(&m_Rtb);
   EXPECT_EQ(SOAP_TYPE, GetTitles(assets("<VL1:FileProfile>HD</VL1:FileProfile>"), &r));
 }
 
+// An empty array is there with no items, a missing one is null; a response without its result
+// element reads without one.
 TEST_F(SoapDecode, EmptyArrayMissingArrayAndMissingResult) {
   _VL1__getTitlesByNavigationResponse* r;
-  ASSERT_EQ(SOAP_OK, GetTitles("<VL1:getTitlesByNavigationResult><VL1:Titles/></VL1:getTitlesByNavigationResult>", &r));
+  ASSERT_EQ(SOAP_OK, GetTitles("<VL1:getTitlesByNavigationResult><VL1:ResponseMessage>OK</VL1:ResponseMessage>"
+                               "<VL1:TotalItems>1</VL1:TotalItems><VL1:Titles/></VL1:getTitlesByNavigationResult>",
+                               &r));
+  EXPECT_STREQ("OK", r->getTitlesByNavigationResult->ResponseMessage);
+  EXPECT_EQ(1, r->getTitlesByNavigationResult->TotalItems);
   ASSERT_NE(nullptr, r->getTitlesByNavigationResult->Titles);
   EXPECT_EQ(0, r->getTitlesByNavigationResult->Titles->__sizeTitleListing);
-  soap_destroy(&m_Rtb);
-  soap_end(&m_Rtb);
-  ASSERT_EQ(SOAP_OK, GetTitles("<VL1:getTitlesByNavigationResult><VL1:GenreID>3</VL1:GenreID></VL1:getTitlesByNavigationResult>", &r));
+  ASSERT_EQ(SOAP_OK, GetTitles("<VL1:getTitlesByNavigationResult><VL1:GenreID>3</VL1:GenreID>"
+                               "</VL1:getTitlesByNavigationResult>",
+                               &r));
   EXPECT_EQ(3, r->getTitlesByNavigationResult->GenreID);
   EXPECT_EQ(nullptr, r->getTitlesByNavigationResult->Titles);
-  soap_destroy(&m_Rtb);
-  soap_end(&m_Rtb);
   ASSERT_EQ(SOAP_OK, GetTitles("", &r));
   EXPECT_EQ(nullptr, r->getTitlesByNavigationResult);
 }
@@ -153,25 +155,25 @@ TEST_F(SoapDecode, GzipReplyIsInflated) {
 
 TEST_F(SoapDecode, FaultsAndHttpStatuses) {
   LogCapture log;
-  struct Case {
+  auto fault = [](const std::string& code) {
+    return VLTestServer::HttpReply(VLTestServer::Envelope("<SOAP-ENV:Fault><faultcode>" + code + "</faultcode>"
+                                                          "<faultstring>Store is down</faultstring></SOAP-ENV:Fault>"),
+                                   "500 Internal Server Error");
+  };
+  const struct {
     std::string reply;
     int code;
-  } cases[] = {
-      {VLTestServer::HttpReply(VLTestServer::Envelope("<SOAP-ENV:Fault><faultcode>SOAP-ENV:Server</faultcode>"
-                                                      "<faultstring>Store is down</faultstring></SOAP-ENV:Fault>"),
-                               "500 Internal Server Error"),
-       SOAP_SVR_FAULT},
-      {VLTestServer::HttpReply(VLTestServer::Envelope("<SOAP-ENV:Fault><faultcode>VL1:Throttled</faultcode>"
-                                                      "<faultstring>Store is down</faultstring></SOAP-ENV:Fault>"),
-                               "500 Internal Server Error"),
-       SOAP_FAULT},
-      {VLTestServer::HttpReply("<html>gone</html>", "404 Not Found"), 404},
-  };
-  for (const Case& c : cases) {
+  } cases[] = {{fault("SOAP-ENV:Server"), SOAP_SVR_FAULT},
+               {fault("VL1:Throttled"), SOAP_FAULT},
+               {VLTestServer::HttpReply("<html>gone</html>", "404 Not Found"), 404}};
+  for (const auto& c : cases) {
     m_Server.SetReply(c.reply);
     ASSERT_EQ(SOAP_OK, m_Rtb.Setup("getFileType"));
-    EXPECT_EQ(c.code, m_Rtb.getFileType(soap_new__VL1__getFileType(&m_Rtb), soap_new__VL1__getFileTypeResponse(&m_Rtb)));
-    if (c.code != 404) EXPECT_STREQ("Store is down", m_Rtb.soap_fault_string());
+    EXPECT_EQ(c.code,
+              m_Rtb.getFileType(soap_new__VL1__getFileType(&m_Rtb), soap_new__VL1__getFileTypeResponse(&m_Rtb)));
+    if (c.code != 404) {
+      EXPECT_STREQ("Store is down", m_Rtb.soap_fault_string());
+    }
     soap_destroy(&m_Rtb);
     soap_end(&m_Rtb);
   }
