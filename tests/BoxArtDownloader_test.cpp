@@ -108,8 +108,8 @@ TEST_F(BoxArtDownloaderTest, ReadsTheImageAndItsValidators) {
   EXPECT_EQ(0u, m_Downloader.GetContentLength());
 }
 
-// Anything but a complete 200 answer fails and leaves no bytes. The header must announce a sane
-// length (at most 32 MiB) within the first piece.
+// Anything but a complete 200 answer fails and leaves no bytes. (VLHttpGet's own tests have every
+// form of answer it does not take; here is one of them.)
 TEST_F(BoxArtDownloaderTest, AnswersOtherThanACompleteImageFail) {
   const struct {
     std::string reply;
@@ -119,18 +119,9 @@ TEST_F(BoxArtDownloaderTest, AnswersOtherThanACompleteImageFail) {
       {std::string("HTTP/1.1 304 Not Modified\r\nLast-Modified: ") + kLastModified + "\r\n\r\n",
        VL_WS_E_HTTP_NOT_MODIFIED},
       {"HTTP/1.1 500 Internal Server Error\r\nContent-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
-      {"HTTP/1.0 200 OK\r\nContent-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
       {"", VL_WS_E_NETWORK},  // the host closes without answering
       {"HTTP/1.1 200 OK\r\nContent-Length: 100\r\n\r\nshort", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\nContent-Type: image/jpeg\r\n\r\nabc", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\nContent-Length: -5\r\n\r\nabc", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 3x\r\n\r\nabc", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 3", VL_WS_E_NETWORK},  // no end of line, no blank line
-      {"HTTP/1.1 200 OK\r\nX: y\r\n\r\nContent-Length: 3\r\n\r\nabc", VL_WS_E_NETWORK},  // in the body
-      {"HTTP/1.1 200 OK\r\nContent-Length: 33554433\r\n\r\nabc", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 99999999999\r\n\r\nabc", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\nX-Pad: " + std::string(2040, 'p') + "\r\nContent-Length: 3\r\n\r\nabc", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 33554433\r\n\r\nabc", VL_WS_E_NETWORK},  // above 32 MiB
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(c.reply.substr(0, 80));
