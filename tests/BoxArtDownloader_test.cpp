@@ -1,8 +1,6 @@
 // BoxArtDownloader against a canned image host (a loopback server that plays one answer per
 // connection): the request it sends, how it reads answers, and what it leaves on disk.
-#include <dirent.h>
 #include <gtest/gtest.h>
-#include <stdlib.h>
 #include <sys/stat.h>
 
 #include <set>
@@ -16,34 +14,9 @@
 
 namespace {
 
-// The image host of this program: VLWS_CONNECT_TO sends images.ostrel.example:80 here. The
-// library reads the variable once, at its first connection.
-VLTestServer& ImageHost() {
-  // Never destroyed: at exit its thread would outlive OpenSSL's clean-up.
-  static VLTestServer& s_Server = *new VLTestServer();
-  static const bool s_Mapped = [] {
-    std::string map = std::string(VL_STORE_IMAGE_HOST) + ":80:127.0.0.1:" + std::to_string(s_Server.Port());
-    return setenv("VLWS_CONNECT_TO", map.c_str(), 1) == 0;
-  }();
-  EXPECT_TRUE(s_Mapped);
-  return s_Server;
-}
-
-// The names in a folder.
-std::set<std::string> Files(const std::string& folder) {
-  std::set<std::string> names;
-  DIR* dir = opendir(folder.c_str());
-  while (dirent* entry = dir ? readdir(dir) : nullptr) {
-    std::string name = entry->d_name;
-    if (name != "." && name != "..") names.insert(name);
-  }
-  if (dir) closedir(dir);
-  return names;
-}
-
+// A complete answer of the image host.
 std::string Ok(const std::string& body, const std::string& headers = "") {
-  return "HTTP/1.1 200 OK\r\nContent-Type: image/jpeg\r\n" + headers + "Content-Length: " + std::to_string(body.size()) +
-         "\r\nConnection: close\r\n\r\n" + body;
+  return VLTestServer::HttpReply(body, "200 OK", headers);
 }
 
 // Bytes of every value, zeros included, as an image has them.
@@ -72,7 +45,7 @@ class BoxArtDownloaderTest : public testing::Test {
   }
   std::string LastRequest() { return m_Host.Requests().empty() ? "" : m_Host.Requests().back(); }
 
-  VLTestServer& m_Host = ImageHost();
+  VLTestServer& m_Host = VLStandInServer(VL_STORE_IMAGE_HOST, 80);
   RealTimeBrowse m_Context;  // a catalogue context: the library's transport and time-outs
   BoxArtDownloader m_Downloader;
 };
@@ -145,7 +118,7 @@ TEST_F(BoxArtDownloaderTest, FileIsReplacedOnlyByACompleteImage) {
   std::string image = Image(5000);
   ASSERT_EQ(VL_WS_OK, GetFile(Ok(image), file));
   EXPECT_EQ(image, VLReadFile(file));
-  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, Files(dir.path()));
+  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, VLFolderFiles(dir.path()));
 
   const char* failures[] = {
       "HTTP/1.1 304 Not Modified\r\n\r\n",
@@ -158,12 +131,12 @@ TEST_F(BoxArtDownloaderTest, FileIsReplacedOnlyByACompleteImage) {
     SCOPED_TRACE(reply);
     EXPECT_NE(VL_WS_OK, GetFile(reply, file));
     EXPECT_EQ(image, VLReadFile(file));
-    EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, Files(dir.path()));
+    EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, VLFolderFiles(dir.path()));
   }
   // A new file appears only when complete.
   std::string fresh = dir / "t1001_95.jpg";
   EXPECT_EQ(VL_WS_E_NETWORK, GetFile("HTTP/1.1 200 OK\r\nContent-Length: 10\r\n\r\nabc", fresh));
-  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, Files(dir.path()));
+  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, VLFolderFiles(dir.path()));
 }
 
 TEST_F(BoxArtDownloaderTest, FileThatCannotBeWrittenEndsWithAFileError) {
@@ -178,7 +151,7 @@ TEST_F(BoxArtDownloaderTest, FileThatCannotBeWrittenEndsWithAFileError) {
   ASSERT_EQ(0, mkdir(blocked.c_str(), 0755));
   ASSERT_TRUE(VLWriteFile(blocked + "/keep", "x"));
   EXPECT_EQ(VL_WS_E_FILE, GetFile(Ok("abc"), blocked));
-  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, Files(dir.path()));
+  EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, VLFolderFiles(dir.path()));
 }
 
 TEST_F(BoxArtDownloaderTest, UnreachableHostEndsWithAConnectionError) {
@@ -189,7 +162,7 @@ TEST_F(BoxArtDownloaderTest, UnreachableHostEndsWithAConnectionError) {
   std::string data;
   EXPECT_EQ(VL_WS_E_CONNECT, Get(Ok("abc"), &data));
   EXPECT_EQ(VL_WS_E_CONNECT, GetFile(Ok("abc"), dir / "t1001_175.jpg"));
-  EXPECT_TRUE(Files(dir.path()).empty());
+  EXPECT_TRUE(VLFolderFiles(dir.path()).empty());
   m_Context.proxy_host = nullptr;
 }
 

@@ -10,7 +10,7 @@
 #include <unistd.h>
 
 #include <chrono>
-#include <filesystem>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -37,12 +37,6 @@ Got ReadSetting(const std::string& path, const char* key, bool encrypted = false
 CfgXMLFile::Result WriteSetting(const std::string& path, const char* key, const std::string& value,
                                 bool encrypted = false) {
   return CfgXMLFile(path.c_str()).Write(key, VLString(value.data(), value.size()), encrypted);
-}
-
-std::vector<std::string> FileNames(const std::string& folder) {
-  std::vector<std::string> names;
-  for (const auto& entry : std::filesystem::directory_iterator(folder)) names.push_back(entry.path().filename());
-  return names;
 }
 
 #define EXPECT_READ(path, key, encrypted, code, text)     \
@@ -80,7 +74,7 @@ TEST(CfgXMLFile, WritesKeepOrderAndReplaceInPlace) {
   EXPECT_EQ(CfgXMLFile::CFG_EMPTY_KEY, WriteSetting(path, "", "x"));
 
   // Nothing but the file itself is left in the folder.
-  EXPECT_EQ(std::vector<std::string>{"settings.xml"}, FileNames(dir.path()));
+  EXPECT_EQ(std::set<std::string>{"settings.xml"}, VLFolderFiles(dir.path()));
 }
 
 TEST(CfgXMLFile, FilesThatHoldNoSetting) {
@@ -324,7 +318,7 @@ TEST(CfgXMLFile, KilledWriterLeavesTheOldOrTheNewFile) {
     ASSERT_TRUE(text == file.oldText || text == file.newText) << "round " << round;
     seenOld += text == file.oldText;
     seenNew += text == file.newText;
-    seenLeftover = seenLeftover || FileNames(dir.path()).size() > 1;
+    seenLeftover = seenLeftover || VLFolderFiles(dir.path()).size() > 1;
     EXPECT_READ(file.path, "key99", false, CFG_OK, "value key99");
     EXPECT_READ(file.path, "Token", true, CFG_OK, "secret");
   }
@@ -350,7 +344,7 @@ TEST(CfgXMLFile, FullDiskLeavesTheOldFile) {
   ASSERT_TRUE(WIFEXITED(status));
   EXPECT_EQ(CfgXMLFile::CFG_FILE_ERROR, WEXITSTATUS(status));
   EXPECT_EQ(file.oldText, VLReadFile(file.path));
-  EXPECT_EQ(std::vector<std::string>{"large.xml"}, FileNames(dir.path()));  // temp file removed
+  EXPECT_EQ(std::set<std::string>{"large.xml"}, VLFolderFiles(dir.path()));  // temp file removed
 }
 
 }  // namespace

@@ -4,7 +4,6 @@
 
 #include <sys/stat.h>
 
-#include <filesystem>
 #include <set>
 #include <string>
 
@@ -16,13 +15,6 @@ namespace {
 std::string Str(const VLString& s) { return std::string(s.c_str(), s.length()); }
 
 bool IsFolder(const std::string& path) { return VLFile::FolderExist(path.c_str()); }
-
-// The names in a folder, folders included.
-std::set<std::string> Entries(const std::string& folder) {
-  std::set<std::string> names;
-  for (const auto& entry : std::filesystem::directory_iterator(folder)) names.insert(entry.path().filename());
-  return names;
-}
 
 TEST(VLFile, StreamOperations) {
   VLTestDir dir;
@@ -121,10 +113,10 @@ TEST(VLFile, RemoveWithWildcardTakesHiddenFilesButNeverDotEntries) {
   VLWriteFile(dir / "sub/d.jpg", "deeper");
 
   EXPECT_TRUE(VLFile::RemoveWithWildcard((dir / "*.jpg").c_str()));
-  EXPECT_EQ((std::set<std::string>{"b.png", "c.jpg.txt", "sub", "x.png"}), Entries(dir.path()));
+  EXPECT_EQ((std::set<std::string>{"b.png", "c.jpg.txt", "sub", "x.png"}), VLFolderFiles(dir.path()));
   EXPECT_TRUE(VLFile::Exist((dir / "sub/d.jpg").c_str()));  // one folder only
   EXPECT_TRUE(VLFile::RemoveWithWildcard((dir / "?.png").c_str()));
-  EXPECT_EQ((std::set<std::string>{"c.jpg.txt", "sub"}), Entries(dir.path()));
+  EXPECT_EQ((std::set<std::string>{"c.jpg.txt", "sub"}), VLFolderFiles(dir.path()));
 
   // "*" matches "." and "..", which stay; the non-empty folder "sub" cannot go: false.
   EXPECT_FALSE(VLFile::RemoveWithWildcard((dir / "*").c_str()));
@@ -132,7 +124,7 @@ TEST(VLFile, RemoveWithWildcardTakesHiddenFilesButNeverDotEntries) {
   EXPECT_TRUE(VLFile::Remove((dir / "sub/d.jpg").c_str()));
   EXPECT_TRUE(VLFile::RemoveWithWildcard((dir / "*").c_str()));
   EXPECT_TRUE(IsFolder(dir.path()));
-  EXPECT_TRUE(Entries(dir.path()).empty());
+  EXPECT_TRUE(VLFolderFiles(dir.path()).empty());
 
   EXPECT_FALSE(VLFile::RemoveWithWildcard((dir / "missing/*.jpg").c_str()));
   EXPECT_TRUE(VLFile::RemoveWithWildcard((dir / "*.none").c_str()));

@@ -2,7 +2,6 @@
 // service (a loopback TLS server that plays one answer per connection): the exact request and
 // which answers are accepted.
 #include <gtest/gtest.h>
-#include <stdlib.h>
 
 #include <string>
 
@@ -14,23 +13,7 @@
 
 namespace {
 
-// The device-environment service of this program: VLWS_CONNECT_TO sends the production host's
-// port 443 here, and the test CA is trusted through SSL_CERT_FILE.
-VLTestServer& EnvironmentService() {
-  // Never destroyed: at exit its thread would outlive OpenSSL's clean-up.
-  static VLTestServer& s_Server = *new VLTestServer(&VLTestPKI::Get().Trusted());
-  static const bool s_Mapped = [] {
-    std::string map = std::string(VL_STORE_PRODUCTION_HOST) + ":443:127.0.0.1:" + std::to_string(s_Server.Port());
-    return setenv("VLWS_CONNECT_TO", map.c_str(), 1) == 0;
-  }();
-  EXPECT_TRUE(s_Mapped);
-  return s_Server;
-}
-
-std::string Answer(const std::string& body) {
-  return "HTTP/1.1 200 OK\r\nContent-Type: text/plain\r\nContent-Length: " + std::to_string(body.size()) +
-         "\r\nConnection: close\r\n\r\n" + body;
-}
+std::string Answer(const std::string& body) { return VLTestServer::HttpReply(body, "200 OK"); }
 
 class EndpointQuery : public testing::Test {
  protected:
@@ -50,7 +33,7 @@ class EndpointQuery : public testing::Test {
     return url;
   }
 
-  VLTestServer& m_Service = EnvironmentService();
+  VLTestServer& m_Service = VLStandInServer(VL_STORE_PRODUCTION_HOST, 443, &VLTestPKI::Get().Trusted());
   StreamAPI m_Context;
   std::string m_Printed;
 };

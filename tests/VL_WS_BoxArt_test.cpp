@@ -1,8 +1,8 @@
 // The box-art operations against the store simulator's image host: the file cache (image files
 // beside the database, revalidation), the memory cache, no cache, failures and the proxy.
-#include <dirent.h>
 #include <gtest/gtest.h>
 
+#include <set>
 #include <string>
 #include <vector>
 
@@ -18,14 +18,10 @@
 namespace {
 
 // The names in a folder that are not the cache database.
-std::vector<std::string> ImageFolderFiles(const std::string& folder) {
-  std::vector<std::string> names;
-  DIR* dir = opendir(folder.c_str());
-  while (dirent* entry = dir ? readdir(dir) : nullptr) {
-    std::string name = entry->d_name;
-    if (name != "." && name != ".." && name.find(".vl") == std::string::npos) names.push_back(name);
-  }
-  if (dir) closedir(dir);
+std::set<std::string> ImageFolderFiles(const std::string& folder) {
+  std::set<std::string> names;
+  for (const std::string& name : VLFolderFiles(folder))
+    if (name.find(".vl") == std::string::npos) names.insert(name);
   return names;
 }
 

@@ -1,5 +1,6 @@
 #include "VLTestDir.h"
 
+#include <dirent.h>
 #include <ftw.h>
 #include <gtest/gtest.h>
 #include <limits.h>
@@ -52,4 +53,15 @@ bool VLWriteFile(const std::string& path, const std::string& content) {
   out << content;
   out.close();
   return static_cast<bool>(out);
+}
+
+std::set<std::string> VLFolderFiles(const std::string& folder) {
+  std::set<std::string> names;
+  DIR* dir = opendir(folder.c_str());
+  while (dirent* entry = dir ? readdir(dir) : nullptr) {
+    std::string name = entry->d_name;
+    if (name != "." && name != "..") names.insert(name);
+  }
+  if (dir) closedir(dir);
+  return names;
 }

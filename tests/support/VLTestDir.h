@@ -3,6 +3,7 @@
 #ifndef VLTESTDIR_H
 #define VLTESTDIR_H
 
+#include <set>
 #include <string>
 
 // A new empty directory below testing::TempDir(), removed with everything in it at the end of
@@ -33,6 +34,9 @@ class VLScopedCurrentDir {
  private:
   std::string m_Previous;
 };
+
+// The names of everything in a folder, "." and ".." left out (none when it cannot be read).
+std::set<std::string> VLFolderFiles(const std::string& folder);
 
 // Whole content of a file ("" when it cannot be read).
 std::string VLReadFile(const std::string& path);

@@ -10,6 +10,8 @@
 #include <unistd.h>
 #include <zlib.h>
 
+#include <gtest/gtest.h>
+
 #include <chrono>
 
 #include <openssl/err.h>
@@ -253,4 +255,14 @@ int VLClosedPort() {
   getsockname(fd, reinterpret_cast<sockaddr*>(&addr), &len);
   close(fd);
   return ntohs(addr.sin_port);
+}
+
+VLTestServer& VLStandInServer(const char* host, int port, const VLTestPKI::Cert* cert) {
+  static VLTestServer& s_Server = *new VLTestServer(cert);
+  static const bool s_Mapped = [&] {
+    std::string map = std::string(host) + ":" + std::to_string(port) + ":127.0.0.1:" + std::to_string(s_Server.Port());
+    return setenv("VLWS_CONNECT_TO", map.c_str(), 1) == 0;
+  }();
+  EXPECT_TRUE(s_Mapped);
+  return s_Server;
 }

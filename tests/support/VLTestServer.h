@@ -5,6 +5,7 @@
 #define VLTESTSERVER_H
 
 #include "VLSimCertificates.h"
+#include "VL_WS_SetupParams2.h"
 
 #include <openssl/evp.h>
 #include <openssl/x509.h>
@@ -99,10 +100,14 @@ class VLTestServer {
 // A loopback port on which nobody listens (bound once and released): connections to it fail.
 int VLClosedPort();
 
-#endif  // VLTESTSERVER_H
-
-#include "VL_WS_SetupParams2.h"
+// The program's one loopback server standing in for host:port (TLS with cert): VLWS_CONNECT_TO
+// sends that host and port here. The library reads the variable once, at its first connection,
+// so a program calls this before anything connects, and only for one host and port. Never destroyed: at exit its thread would
+// outlive OpenSSL's clean-up.
+VLTestServer& VLStandInServer(const char* host, int port, const VLTestPKI::Cert* cert = nullptr);
 
 // Settings of a test client: key "key", device "00-11-22-33-44-55" of type 7, user "user" with
 // password "secret", the given endpoint base (ending in "/"), short time-outs (5 s).
 void VLTestFillParams(VL_WS_SetupParams2* params, const std::string& serviceBaseURL);
+
+#endif  // VLTESTSERVER_H
