@@ -102,8 +102,8 @@ int VLClosedPort();
 
 // The program's one loopback server standing in for host:port (TLS with cert): VLWS_CONNECT_TO
 // sends that host and port here. The library reads the variable once, at its first connection,
-// so a program calls this before anything connects, and only for one host and port. Never destroyed: at exit its thread would
-// outlive OpenSSL's clean-up.
+// so a program calls this before anything connects, and for one host and port only. Never
+// destroyed: at exit its thread would outlive OpenSSL's clean-up.
 VLTestServer& VLStandInServer(const char* host, int port, const VLTestPKI::Cert* cert = nullptr);
 
 // Settings of a test client: key "key", device "00-11-22-33-44-55" of type 7, user "user" with
