@@ -41,6 +41,9 @@ VeloraApp::VeloraApp() : m_Stage(nullptr) {}
 
 VeloraApp::~VeloraApp() {
   Trace("~VeloraApp", 78);
+  // Store objects the movie dropped mid-request are still being deleted; their threads run the
+  // library's code, which must not go before they have ended.
+  DUDUVudAE::JoinDroppedInstances();
   printf("[VL_FLASH] Uninit network ipc \n");
   uninit_network_msg_queue();
   int ret = Ipriv_drm_Terminate();
