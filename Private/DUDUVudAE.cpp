@@ -440,7 +440,7 @@ const DUDUVudAE::MethodEntry DUDUVudAE::s_Methods[] = {
                              "purchaseType:%d \n",
                              r.i[0], r.i[1], r.i[2], r.i[3]);
        o.m_PurchaseType = r.i[3];
-       o.m_PrefetchWanted = false;
+       o.m_PrefetchWanted = o.m_CacheType == kCacheFile;
        return true;
      },
      DUDUVud::getTitles, RESULT_TITLES},
@@ -457,7 +457,7 @@ const DUDUVudAE::MethodEntry DUDUVudAE::s_Methods[] = {
      RESULT_TV_EPISODE_LIST},
     {"getAllTvEpisodeListings", nullptr, 2, {"titleid"},
      [](DUDUVudAE& o, const ASObject&, Param_Store&) {
-       o.m_PrefetchWanted = false;
+       o.m_PrefetchWanted = o.m_CacheType == kCacheFile;
        return true;
      },
      DUDUVud::getAllTvEpisodeListings, RESULT_ALL_TV_EPISODE_LISTINGS},
@@ -477,7 +477,7 @@ const DUDUVudAE::MethodEntry DUDUVudAE::s_Methods[] = {
        o.m_PurchaseType = r.i[2];
        o.m_TypeFilter = r.i[3];
        o.m_WatchStatus = r.i[4];
-       o.m_PrefetchWanted = false;
+       o.m_PrefetchWanted = o.m_CacheType == kCacheFile;
        return true;
      },
      DUDUVud::getMyVideos, RESULT_MY_VIDEOS},
@@ -485,7 +485,7 @@ const DUDUVudAE::MethodEntry DUDUVudAE::s_Methods[] = {
      [](DUDUVudAE& o, const ASObject&, Param_Store& r) {
        o.m_SortOrder = r.i[0];
        o.m_TypeFilter = r.i[3];
-       o.m_PrefetchWanted = false;
+       o.m_PrefetchWanted = o.m_CacheType == kCacheFile;
        return true;
      },
      DUDUVud::getWishlistItems, RESULT_WISHLIST_ITEMS},
@@ -644,6 +644,7 @@ DUDUVudAE::DUDUVudAE()
       m_PagePrefetchRunning(false),
       m_BoxArtPrefetchRunning(false),
       m_IdleSeen(false),
+      m_WaitingBoxArts(8),
       m_RequestName("") {
   VLWSAELog log(kClassName, "DUDUVudAE", s_Log.Id());
   IAEKernel* kernel = IAEKernel::GetKernel();
@@ -655,6 +656,7 @@ DUDUVudAE::DUDUVudAE()
   m_PrefetchLock = kernel->CreateMutex();
   m_Lock = kernel->CreateMutex();
   VL_ASSERT(m_PrefetchLock != 0 && m_Lock != 0);
+  m_Prefetch.SetMutex(m_PrefetchLock);
 }
 
 DUDUVudAE::~DUDUVudAE() {
@@ -734,6 +736,7 @@ int DUDUVudAE::StartRequest(const MethodEntry& entry, ASObject& object, ASValueA
   if (m_Thread) return kBusy;
   ASObject callback, parameters;
   if (!ReadArguments(arguments, entry.elements, &callback, &parameters)) return kWrongArguments;
+  m_PrefetchWanted = false;
   Param_Store* record = new Param_Store(this);
   for (size_t k = 0; k < 5 && entry.ints[k]; ++k) record->i[k] = Int(parameters, entry.ints[k]);
   if (entry.read && !entry.read(*this, parameters, *record)) {
@@ -759,7 +762,10 @@ void DUDUVudAE::StoreMethod(StageWindow*, ASObject& object, ASValueArray& argume
 }
 
 void DUDUVudAE::OnUpdate(StageWindow*, ASObject& object) {
-  if (!m_ResultReady.load(std::memory_order_acquire)) return;
+  if (!m_ResultReady.load(std::memory_order_acquire)) {
+    StartBoxArtDownload();
+    return;
+  }
   object.StopUpdates();
   m_ResultReady.store(false, std::memory_order_relaxed);
   VLThread::Sleep(10);
@@ -774,6 +780,7 @@ void DUDUVudAE::OnUpdate(StageWindow*, ASObject& object) {
     DiscardResult();
     return;
   }
+  if (m_Result.status == VL_WS_OK && m_CacheType == kCacheFile && m_PrefetchWanted) SchedulePrefetch();
   ASValue value;
   DUDUVud::SetResult(m_Result, value, callback);
   m_Result.type = RESULT_NONE;

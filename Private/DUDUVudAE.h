@@ -157,6 +157,39 @@ class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
   template <int I>
   void StoreMethod(StageWindow* window, ASObject& object, ASValueArray& arguments, ASValue& result);
 
+  // Which pages of the current page query are in the cache, and which of its neighbours to fetch
+  // next. Shared by the engine's thread and the page-prefetch thread under the prefetch lock.
+  class PrefetchMgr {
+   public:
+    PrefetchMgr();
+    void SetMutex(IAEKernel::Mutex* lock);
+    // Records the query of a page result; when any part of it changed, the pages counted so far
+    // and the waiting box art are forgotten.
+    void Update(AEArray<AEString>& waiting, Result_Type type, unsigned totalPages, unsigned totalItems,
+                unsigned itemsPerPage, int p1, int p2, int p3);
+    void MarkPagePrefetched(unsigned page);
+    // Whether page was counted (the caller holds the lock).
+    bool IsPageAlreadyPrefetched(unsigned page) const;
+    // Up to `wanted` pages around `current` that were not counted yet, alternately the next and
+    // the previous ones, nearest first, wrapping around at both ends; `found` of them in pages.
+    void GetPagesForPrefetch(unsigned current, unsigned wanted, unsigned* pages, unsigned& found);
+
+   private:
+    IAEKernel::Mutex* m_Lock;
+    Result_Type m_Type;
+    unsigned m_TotalPages;
+    unsigned m_TotalItems;
+    unsigned m_ItemsPerPage;
+    int m_Query[3];
+    AEArray<unsigned> m_Pages;
+  };
+
+  // Puts prefixes in front of the waiting box-art list, which keeps little over 50 entries.
+  void AddWaitingForDownloadBoxArts(const AEArray<AEString>& prefixes);
+
+  // The record of a prefetch thread (defined with the prefetch workers).
+  struct PrefetchParam;
+
   void OnUpdate(StageWindow* window, ASObject& object) override;
   ~DUDUVudAE() override;
 
@@ -174,6 +207,13 @@ class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
   void RunThread(const char* name, void (*worker)(void*), Param* record, ASObject& object);
   // Waits for the thread in slot to end, then destroys it and clears the slot.
   void SafeDestroyThread(VLThread*& slot);
+  // After a page result: counts the page and starts fetching its neighbours.
+  void SchedulePrefetch();
+  // While the movie is idle: starts the download of the first waiting box-art image.
+  void StartBoxArtDownload();
+  // Starts a prefetch thread: "prefetch_getTitles" in the page slot, any other in the box-art
+  // slot.
+  void RunPrefetchThread(const char* name, void (*worker)(void*), PrefetchParam* record);
   // Duplicates source into the prefetch clients that the cache type and selection ask for.
   void MakePrefetchClients(const VL_WS_Handle* source);
   // Whether a worker or prefetch thread of the instance still exists.
@@ -209,6 +249,9 @@ class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
   std::atomic<bool> m_PagePrefetchRunning;
   std::atomic<bool> m_BoxArtPrefetchRunning;
   bool m_IdleSeen;
+  // The box-art prefixes waiting for download, under the prefetch lock.
+  AEArray<AEString> m_WaitingBoxArts;
+  PrefetchMgr m_Prefetch;
   // The method of the request in progress, for the worker's log line.
   const char* m_RequestName;
 };
