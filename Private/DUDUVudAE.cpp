@@ -916,7 +916,7 @@ void DUDUVudAE::quitFlash(StageWindow* window, ASObject& object, ASValueArray&, 
 
 void DUDUVudAE::getUserAgent(StageWindow*, ASObject&, ASValueArray&, ASValue& result) {
   VLWSAELog log(kClassName, "getUserAgent", s_Log.Id());
-  VL_WS_String agent;
+  VL_WS_String agent = {};
   VL_WS_Status status = VL_WS_getUserAgent(&m_Client, &agent);
   result.SetString(status == VL_WS_OK ? agent.Text : "");
   VL_WS_release(&agent);
@@ -948,7 +948,7 @@ void DUDUVudAE::checkVLSWFmd5sum(StageWindow*, ASObject&, ASValueArray& argument
   result.SetString("");
   AEString path;
   if (!TextArgument(arguments, &path)) return;
-  VL_WS_String md5sum;
+  VL_WS_String md5sum = {};
   if (VL_WS_checkVLSWFmd5sum(path.CString(), &md5sum) == VL_WS_OK) {
     result.SetString(md5sum.Text);
     VLLogOutputwithConfig(Trace(), "DUDUVudAE::checkVLSWFmd5sum result: (%s)\n", md5sum.Text);

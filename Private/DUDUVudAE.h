@@ -184,8 +184,10 @@ class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
     AEArray<unsigned> m_Pages;
   };
 
-  // Puts prefixes in front of the waiting box-art list, which keeps little over 50 entries.
+  // Puts prefixes in front of the waiting box-art list (under the prefetch lock).
   void AddWaitingForDownloadBoxArts(const AEArray<AEString>& prefixes);
+  // The new prefixes, then the waiting ones in their order while the list holds at most 50.
+  static void MergeWaitingBoxArts(AEArray<AEString>& waiting, const AEArray<AEString>& prefixes);
 
   // The record of a prefetch thread (defined with the prefetch workers).
   struct PrefetchParam;

@@ -166,7 +166,7 @@ void DUDUVudAE::PrefetchParam::FetchPages(const char* name, Fetch fetch) {
     unsigned page = pages[k];
     if (page == 0 || page == static_cast<unsigned>(current)) break;
     VLLogOutputwithConfig(Trace(), "%s, page:%d begin  \n", name, page);
-    Response response;
+    Response response = {};
     VL_WS_Status status = fetch(static_cast<int>(page), &response);
     if (status != VL_WS_OK) {
       VL_WS_release(&response);
@@ -193,7 +193,7 @@ void DUDUVudAE::PrefetchParam::DownloadBoxArts() {
   for (size_t k = 0; k < prefixes.Size(); ++k) {
     const char* prefix = prefixes[k].CString();
     VLLogOutputwithConfig(Trace(), "DUDUVud::prefetch_getBoxArts (%s) begin \n", prefix);
-    VL_WS_String location;
+    VL_WS_String location = {};
     VL_WS_Status status = VL_WS_getBoxArtImage(&instance->m_BoxArtPrefetchClient,
                                                static_cast<VL_WS_BoxArtSize>(boxArtSize), prefix, &location);
     VL_WS_release(&location);
@@ -248,14 +248,16 @@ void prefetch_getBoxArts(void* p) { Prefetch(p).DownloadBoxArts(); }
 VL_WS_Handle* DUDUVudAE::PrefetchParam::CataloguePrefetchClient() const { return &owner->m_CataloguePrefetchClient; }
 VL_WS_Handle* DUDUVudAE::PrefetchParam::UserDataPrefetchClient() const { return &owner->m_UserDataPrefetchClient; }
 
+void DUDUVudAE::MergeWaitingBoxArts(AEArray<AEString>& waiting, const AEArray<AEString>& prefixes) {
+  AEArray<AEString> merged(prefixes);
+  for (size_t k = 0; k < waiting.Size() && merged.Size() <= kMaxWaitingBoxArts; ++k) merged.Append(waiting[k]);
+  waiting = std::move(merged);
+}
+
 void DUDUVudAE::AddWaitingForDownloadBoxArts(const AEArray<AEString>& prefixes) {
   if (prefixes.IsEmpty()) return;
   Locked lock(m_PrefetchLock);
-  AEArray<AEString> waiting(prefixes);
-  for (size_t k = 0; k < m_WaitingBoxArts.Size() && waiting.Size() <= kMaxWaitingBoxArts; ++k) {
-    waiting.Append(m_WaitingBoxArts[k]);
-  }
-  m_WaitingBoxArts = std::move(waiting);
+  MergeWaitingBoxArts(m_WaitingBoxArts, prefixes);
 }
 
 void DUDUVudAE::RunPrefetchThread(const char* name, void (*worker)(void*), PrefetchParam* record) {
