@@ -114,8 +114,9 @@ TEST(DUDUVudAEMovie, PrefetchesPagesAroundThePageShownAndBoxArtWhileIdle) {
   setenv("VL_TEST_CACHE_DIR", cache.path().c_str(), 1);
   std::string output = PlayMovie("prefetch.js");
   // Around page 5 of 10: the next and previous pages alternately, nearest first; around page 6
-  // only page 10 is new; another purchase type starts afresh; a single page starts nothing.
-  EXPECT_EQ("6 4 7 3 8 2 9 1 10 6 4 7 3 8 2 9 1", Matches(output, "prefetch_getTitles, page:(\\d+) begin"));
+  // only page 10 is new; another purchase type starts afresh; a single page starts nothing. The
+  // store dropped at the end finishes its prefetch before it goes.
+  EXPECT_EQ("6 4 7 3 8 2 9 1 10 6 4 7 3 8 2 9 1 6 4 7 3 8 2 9 1", Matches(output, "prefetch_getTitles, page:(\\d+) begin"));
   EXPECT_EQ("2 3", Matches(output, "prefetch_getWishlistItems, page:(\\d+) begin"));
   EXPECT_EQ("2", Matches(output, "prefetch_getMyVideos, page:(\\d+) begin"));
 

@@ -57,6 +57,12 @@ until('getWishlistItems', 3);
 ask(user, 'getMyVideos', {CurrentPageNumber: 1, ItemsPerPage: 1, purchasetype: 2, typefilter: 0, watchstatus: 3},
     succeeds(2));
 until('getMyStreamingVideos', 2);
+// Dropped while its page prefetch runs: the object goes once the thread has ended.
+ask(titles, 'getTitles', page(5, 1), function (status) {
+  eq(status, 0, 'the last title page');
+  titles = null;
+  Duktape.gc();
+});
 var frame = onEnterFrame;
 onEnterFrame = function () { if (idling) titles.idle(); frame(); };
 run();
