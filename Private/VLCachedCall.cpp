@@ -37,3 +37,7 @@ VLString VLCacheKey(const char* format, ...) {
 void VLLogCallResult(const char* name, int soapError, int responseCode) {
   VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, ret:%d,responseCode:%d\n", name, soapError, responseCode);
 }
+
+void VLLogCacheHit(const char* name) {
+  VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, answered from the cache\n", name);
+}

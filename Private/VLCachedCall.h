@@ -67,6 +67,8 @@ VLString VLCacheKey(const char* format, ...)
 // Logs an operation's result line "<name>, ret:<soapError>,responseCode:<responseCode>" to
 // "VL_WSAE" at level 4.
 void VLLogCallResult(const char* name, int soapError, int responseCode);
+// The line of an answer read from the cache instead of the store.
+void VLLogCacheHit(const char* name);
 
 // One SOAP operation of a service object: its name (for Setup), how its records are made in the
 // context, the call, and its response's result element (a pointer, absent while null, or a
@@ -114,6 +116,7 @@ int VLCachedCall(VL_WS_Client& client, Service& service,
     VLString value;
     fromCache = (cache->*entry->kind.Read)(entry->name, entry->key, value) &&
                 LoadResponse(value, *response, &context) && VLResultOf(response->*op.result) != nullptr;
+    if (fromCache) VLLogCacheHit(op.name);
   }
   if (soapError == SOAP_OK && !fromCache) {
     fill(*request);
