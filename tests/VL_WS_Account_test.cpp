@@ -212,7 +212,8 @@ TEST_F(Account, AccountAnswersAreKeptAsUserData) {
   }
   EXPECT_EQ(3u, Requests(3).size());
   EXPECT_EQ((Lines{"VL_WS_getEmailAddress, ret:0,responseCode:1", "VL_WS_getEmailAddress, ret:0,responseCode:0",
-                   "VL_WS_getEmailAddress, ret:0,responseCode:0", "VL_WS_getSettingsPageInfo, ret:0,responseCode:0",
+                   "getEmailAddress, answered from the cache", "VL_WS_getEmailAddress, ret:0,responseCode:0",
+                   "VL_WS_getSettingsPageInfo, ret:0,responseCode:0", "getSettingsPageInfo, answered from the cache",
                    "VL_WS_getSettingsPageInfo, ret:0,responseCode:0"}),
             TakeLog());
 

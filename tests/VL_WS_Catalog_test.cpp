@@ -776,7 +776,9 @@ TEST_F(Catalog, EveryOperationLogsOneResultLine) {
   VL_WS_getAllTvEpisodeListings(&m_Handle, 999999, &listings);
   VL_WS_release(&listings);
   VL_WS_shouldUpdateCache(&m_Handle, "2001-01-01T00:00:00", &update);
-  EXPECT_EQ((std::vector<std::string>{"VL_WS_getTitles, ret:0,responseCode:0", "VL_WS_getTitles, ret:0,responseCode:0",
+  EXPECT_EQ((std::vector<std::string>{"VL_WS_getTitles, ret:0,responseCode:0",
+                                      "getTitlesByNavigation, answered from the cache",
+                                      "VL_WS_getTitles, ret:0,responseCode:0",
                                       "VL_WS_getTitles, ret:0,responseCode:5", "VL_WS_getTitles, ret:503,responseCode:0",
                                       "VL_WS_getNavigation, ret:0", "VL_WS_getAllTvEpisodeListings, ret:0,responseCode:0",
                                       "VL_WS_shouldUpdateCache, result:1"}),
