@@ -720,6 +720,7 @@ VL_WS_Status VL_WS_getServerTime(time_t* serverTime);
  *   VL_WS_E_FILE              the file cannot be opened or read
  *   VL_WS_E_SETTING_MISSING   the file is empty, holds no settings, or none with the key
  *   VL_WS_E_SETTING_DAMAGED   the encrypted value is damaged (also: an encrypted empty value)
+ *   VL_WS_E_SETTING_UNREADABLE  the file does not parse as a settings file (cut short, garbage)
  * On failure the record is tagged and holds no text.
  */
 VL_WS_Status VL_WS_readSetting(const char* filename, const char* key, VL_WS_String* value,
@@ -732,10 +733,14 @@ VL_WS_Status VL_WS_readSetting(const char* filename, const char* key, VL_WS_Stri
  * The first setting with the key is replaced in place, or a new one is appended; every other
  * setting keeps its place and text. A missing file, and the folder of `filename` when it is
  * missing, are created. The file is replaced whole, so a crash leaves the old or the new file.
- * An empty value written encrypted reads back as VL_WS_E_SETTING_DAMAGED.
+ * A file that does not parse (VL_WS_E_SETTING_UNREADABLE for a read) is kept as
+ * "<filename>.damaged", replacing an older one, before a new file with this one setting takes
+ * its place. A file written with an encrypted value is readable by its owner only. An empty
+ * value written encrypted reads back as VL_WS_E_SETTING_DAMAGED.
  *
  * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (null or empty `filename` or `key`, null `value`)
- * or VL_WS_E_FILE (the folder or the file cannot be created or written).
+ * or VL_WS_E_FILE (the folder or the file cannot be created or written, the file exists but
+ * cannot be read, or a file that does not parse cannot be kept aside).
  */
 VL_WS_Status VL_WS_writeSetting(const char* filename, const char* key, const char* value,
                                 bool encrypted);
