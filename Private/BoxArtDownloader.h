@@ -34,7 +34,8 @@ class BoxArtDownloader {
   //   -2011  no connection to the image host;
   //   -1001  a send or receive failed, or the answer has not the expected form (no
   //          "Content-Length", a length below 1 or above kMaxContentLength, a header longer
-  //          than the first piece, an answer that ends early);
+  //          than the first piece, an encoded body, an answer that ends early, a body that is
+  //          no JPEG image);
   //   -1901  the server answered "404 Not Found";
   //   -1902  the server answered "304 Not Modified" (the stored image is current);
   //   -1900  the temporary file could not be made or written, or not renamed to target.

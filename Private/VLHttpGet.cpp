@@ -91,6 +91,9 @@ VLHttpGet::Result VLHttpGet::ReadHeader() {
   VLString length;
   if (m_HeaderEnd == 0 || !Field("Content-Length", &length) || !ParseNumber(length, 18, &m_ContentLength))
     return HTTP_BAD_ANSWER;
+  // The requests ask for no encoding: an encoded body is not the one they can read.
+  VLString encoding;
+  if (Field("Content-Encoding", &encoding) && strcasecmp(encoding.c_str(), "identity") != 0) return HTTP_BAD_ANSWER;
   m_Body = m_HeaderEnd + 4;
   m_BodyReceived = static_cast<size_t>(m_Piece + m_Received - m_Body);
   if (m_BodyReceived > m_ContentLength) {

@@ -32,7 +32,8 @@ class VLHttpGet {
     HTTP_NOTHING_RECEIVED,  // the peer closed, the receive time-out passed or the receive failed
     HTTP_NOT_FOUND,         // "HTTP/1.1 404 Not Found"
     HTTP_NOT_MODIFIED,      // "HTTP/1.1 304 Not Modified"
-    HTTP_BAD_ANSWER,        // another status, no Content-Length above 0, or a header cut short
+    HTTP_BAD_ANSWER,        // another status, no Content-Length above 0, a Content-Encoding
+                            // other than "identity", or a header cut short
   };
 
   // The first piece of an answer is received into a buffer of this size (one byte is kept for
