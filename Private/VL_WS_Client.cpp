@@ -37,8 +37,10 @@ bool ValidSetup(const VL_WS_SetupParams& in) {
   return in.EnvNum >= 0;
 }
 
-// Gives the handle its tag cell and a new client state, three service objects included.
+// Gives the handle its tag cell and a new client state, three service objects included. Null for
+// a handle that is not empty: making it anew would lose (and leak) what it holds.
 VL_WS_Client* NewClient(VL_WS_Handle* handle) {
+  if (handle->tag != 0 || handle->client != 0) return 0;
   VLRecordInit(*handle);
   handle->client = new VL_WS_Client;
   return handle->client;
@@ -143,6 +145,7 @@ void VLClientRelease(VL_WS_Client* client) {
 extern "C" VL_WS_Status VL_WS_initialize(VL_WS_Handle* handle, const VL_WS_SetupParams* params) {
   if (handle == 0) return VL_WS_E_INVALID_ARGUMENT;
   VL_WS_Client* client = NewClient(handle);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;  // the live handle stays as it is
   if (params == 0 || !ValidSetup(*params)) return Fail(handle, VL_WS_E_INVALID_ARGUMENT);
   const VL_WS_SetupParams& in = *params;
   if (in.CacheType == kFileCache && *in.CachePath && !VLFile::CreateFolder(in.CachePath))
@@ -197,6 +200,7 @@ extern "C" VL_WS_Status VL_WS_initialize(VL_WS_Handle* handle, const VL_WS_Setup
 extern "C" VL_WS_Status VL_WS_duplicate(VL_WS_Handle* copy, const VL_WS_Handle* source) {
   if (copy == 0 || copy == source) return VL_WS_E_INVALID_ARGUMENT;
   VL_WS_Client* client = NewClient(copy);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;  // the live copy stays as it is
   const VL_WS_Client* from = VLClientOf(source);
   if (from == 0) return VL_WS_E_INVALID_ARGUMENT;
   if (!SetupTLS(client)) return VL_WS_E_TLS_SETUP;

@@ -34,7 +34,8 @@ extern "C" {
  * anew.
  *
  * Returns VL_WS_OK, or:
- *   VL_WS_E_INVALID_ARGUMENT  a null argument; APIKey, DestinationUniqueID, UserName or Password
+ *   VL_WS_E_INVALID_ARGUMENT  a null argument; a handle that is not empty (it is left as it
+ *                             is); APIKey, DestinationUniqueID, UserName or Password
  *                             missing or empty; DestinationUniqueID longer than 350 bytes;
  *                             CachePath null with CacheType 2; CacheLimit neither 0 nor at
  *                             least 358400 with a cache; ContentType not 0 or 1; CacheType not
@@ -55,9 +56,10 @@ VL_WS_Status VL_WS_initialize(VL_WS_Handle* handle, const VL_WS_SetupParams* par
  * Nothing is asked of the store again: endpoint, environment, User-Agent, access type and token
  * are the source's. Source and copy share nothing in memory and may be released in any order.
  *
- * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (null `copy`, `copy` equal to `source`, or a
- * source without client state), VL_WS_E_TLS_SETUP or VL_WS_E_CACHE_OPEN. On a failure the copy
- * may hold a partial handle: release it.
+ * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (null `copy`, `copy` equal to `source`, a `copy`
+ * that is not empty, which is left as it is, or a source without client state),
+ * VL_WS_E_TLS_SETUP or VL_WS_E_CACHE_OPEN. On a failure the copy may hold a partial handle:
+ * release it.
  */
 VL_WS_Status VL_WS_duplicate(VL_WS_Handle* copy, const VL_WS_Handle* source);
 

@@ -554,6 +554,23 @@ TEST_F(Client, DuplicateOfAMemoryCacheHandleHasNoCacheAndReleasedHandlesAreEmpty
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
 }
 
+TEST_F(Client, ALiveHandleIsNeverMadeAnew) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  VL_WS_Handle copy = {};
+  ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));
+  const VL_WS_Handle before = m_Handle, copyBefore = copy;
+
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_initialize(&m_Handle, &params));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&copy, &m_Handle));
+  EXPECT_EQ(before.tag, m_Handle.tag);
+  EXPECT_EQ(before.client, m_Handle.client);
+  EXPECT_EQ(copyBefore.client, copy.client);
+  VL_WS_EnvID env;
+  EXPECT_EQ(VL_WS_OK, VL_WS_getDeviceEnv(&m_Handle, &env));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
+}
+
 TEST(ClientInterface, VersionAndEnvironmentList) {
   VL_WS_Version version;
   ASSERT_EQ(VL_WS_OK, VL_WS_getVersion(&version));
