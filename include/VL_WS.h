@@ -123,7 +123,8 @@ VL_WS_Status VL_WS_getFileType(VL_WS_Handle* handle, VL_WS_FileType* fileType);
  * made with access type DOWNLOAD and to the streaming service otherwise. It prepares its result
  * before anything else: a record is cleared and tagged (release it whatever the status), a bool
  * or int result is set to false or 0. It returns VL_WS_E_INVALID_ARGUMENT for a handle without
- * client state, a null result pointer, or a required argument that is missing or empty, before
+ * client state, a null result pointer, a required argument that is missing or empty, or a page
+ * number or page size outside -32768 to 32767 (the store answers them in 16-bit fields), before
  * any request.
  *
  * A failed call (no connection, TLS, HTTP or SOAP failure) returns its status (VL_WS_E_CONNECT,
@@ -434,8 +435,9 @@ VL_WS_Status VL_WS_getAudioDefaultProperty(VL_WS_Handle* handle, int* audioProfi
  * non-zero ResponseCode of the store (the record still holds it); the others return VL_WS_OK and
  * leave the code in the record for the caller.
  *
- * Besides the failures named, every operation returns VL_WS_E_INVALID_ARGUMENT for a null record
- * or a handle without client state, and the status of a failed SOAP call (VL_WS_E_CONNECT,
+ * Besides the failures named, every operation returns VL_WS_E_INVALID_ARGUMENT for a null record,
+ * a handle without client state or a page number or page size outside -32768 to 32767 (the
+ * store answers them in 16-bit fields), and the status of a failed SOAP call (VL_WS_E_CONNECT,
  * VL_WS_E_TLS, VL_WS_E_HTTP_STATUS(n), VL_WS_E_SOAP_FAULT(n), ...), after which the record holds
  * nothing but its tags.
  * ------------------------------------------------------------------------------------------- */

@@ -307,6 +307,29 @@ TEST_F(Catalog, TitlesWithoutClientStateOrRecord) {
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitles(&m_Handle, 1, 1, 5, 2, nullptr));
 }
 
+// The store answers page number and size in 16-bit fields: values beyond them never go out.
+TEST_F(Catalog, PagesBeyondSixteenBitsAreRefusedBeforeAnyRequest) {
+  const int genres[] = {1};
+  for (auto page : std::vector<std::pair<int, int>>{{1, 100000}, {32768, 5}, {-32769, 5}, {1, -100000}}) {
+    SCOPED_TRACE(std::to_string(page.first) + "," + std::to_string(page.second));
+    const int n = page.first, per = page.second;
+    std::vector<std::function<VL_WS_Status()>> calls = {
+        EmptyAnswer<VL_WS_TitlesResponse>([&](auto* r) { return VL_WS_getTitles(&m_Handle, 1, n, per, 2, r); }),
+        EmptyAnswer<VL_WS_TitlesResponseArray>(
+            [&](auto* r) { return VL_WS_getTitlesByGenreIDs(&m_Handle, 1, genres, n, per, 2, r); }),
+        EmptyAnswer<VL_WS_TitlesResponse>([&](auto* r) { return VL_WS_searchForTitle(&m_Handle, n, per, 2, 0, "a", r); }),
+        EmptyAnswer<VL_WS_TitlesResponse>(
+            [&](auto* r) { return VL_WS_searchForTitleDetail(&m_Handle, n, per, 2, 0, "a", r); }),
+        EmptyAnswer<VL_WS_MyVideosResponse>([&](auto* r) { return VL_WS_getMyVideos(&m_Handle, n, per, 2, 0, 0, r); }),
+        EmptyAnswer<VL_WS_WishlistItemsResponse>(
+            [&](auto* r) { return VL_WS_getWishlistItems(&m_Handle, static_cast<VL_WS_SortOrder>(0), n, per, 0, r); }),
+    };
+    for (auto& call : calls) EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, call());
+  }
+  EXPECT_TRUE(RequestsNow().empty());
+  EXPECT_EQ(VL_WS_OK, FetchTitles(32767));
+}
+
 TEST_F(Catalog, NavigationIsTheStoresGenreTreeKeptUnderTheEmptyKeyAndGenreLabelsFoldTheirCode) {
   const std::vector<VLSimGenre>& all = Catalogue().Genres();
   VL_WS_GenreArray genres;
