@@ -113,13 +113,14 @@ VL_WS_AccessType ResolveAccessType(VL_WS_Handle* handle, VL_WS_AccessType given)
 }
 
 // A new open cache, or null. With deleteDamaged, a cache file that cannot be opened (a damaged
-// database, or not one at all) is deleted and the open tried once more.
+// database, not one at all, or a file this process may not open) is deleted and the open tried
+// once more.
 CacheInterface* OpenCache(const VL_WS_CacheParam2& params, bool deleteDamaged) {
   CacheInterface* cache = new CacheMgr;
   if (cache->Open(params) == 0) return cache;
-  if (deleteDamaged && params.CacheType == kFileCache && VLFile::Exist(params.CachePath.c_str())) {
-    VLFile::Remove(params.CachePath.c_str());
-    if (cache->Open(params) == 0) return cache;
+  if (deleteDamaged && params.CacheType == kFileCache && CacheMgr::RemoveDatabaseFile(params.CachePath) &&
+      cache->Open(params) == 0) {
+    return cache;
   }
   delete cache;
   return 0;

@@ -30,8 +30,9 @@ extern "C" {
  * UNKNOWN asks the store through VL_WS_getFileType; a failed question leaves UNKNOWN) and, for
  * CacheType 1 or 2, an open cache refreshed with VL_WS_updateLocalCache(handle, 5). The cache
  * file of CacheType 2 is "<CachePath>/<hashes of device, key, account and cache settings>.vl"
- * (CachePath "" is the current folder); a file that is no usable database is deleted and made
- * anew.
+ * (CachePath "" is the current folder); a file that cannot be opened as a database is deleted
+ * and made anew, and so is a database that SQLite finds damaged later, by the operation that
+ * finds it (which misses).
  *
  * Returns VL_WS_OK, or:
  *   VL_WS_E_INVALID_ARGUMENT  a null argument; a handle that is not empty (it is left as it
