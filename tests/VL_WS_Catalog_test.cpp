@@ -6,6 +6,7 @@
 #include <sys/stat.h>
 
 #include <algorithm>
+#include <chrono>
 #include <functional>
 #include <string>
 #include <vector>
@@ -782,6 +783,37 @@ TEST_F(Catalog, TransportFaultOfEveryOperationLeavesAnEmptyRecordAndNothingKept)
     EXPECT_EQ(-1, Flag(1151));
     EXPECT_EQ(std::vector<std::string>{c.operation}, Sent(1));
   }
+}
+
+// Each wait for the answer is short, but the answer trickles in: the call ends at the deadline of
+// the whole exchange (send and receive time-out together, 1 + 1 s here) with the status a
+// receive time-out gives, SOAP call or hand-built request alike, and the handle works next.
+TEST_F(Catalog, ATricklingAnswerEndsAtTheDeadlineOfTheExchange) {
+  soap& context = m_Handle.client->m_RealTimeBrowse;
+  context.send_timeout = context.recv_timeout = 1;
+  const struct {
+    const char* fault;
+    VL_WS_Status status;
+    std::function<VL_WS_Status()> call;
+  } cases[] = {
+      {"getTitlesByNavigation=trickle:100,times=1", VL_WS_E_EOF, [&] { return FetchTitles(); }},
+      {"/images/boxart/=trickle:100,times=1", VL_WS_E_NETWORK,
+       [&] {
+         VL_WS_Image image;
+         VL_WS_Status status = VL_WS_getBoxArtImageData(&m_Handle, VL_WS_BOXART_321, "t1001_", &image);
+         EXPECT_EQ(nullptr, image.Data);
+         VL_WS_release(&image);
+         return status;
+       }},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.fault);
+    Fault(c.fault);
+    auto start = std::chrono::steady_clock::now();
+    EXPECT_EQ(c.status, c.call());
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10));
+  }
+  EXPECT_EQ(VL_WS_OK, FetchTitles());
 }
 
 TEST_F(Catalog, EveryOperationLogsOneResultLine) {
