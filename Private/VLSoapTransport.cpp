@@ -16,6 +16,7 @@
 #include <unistd.h>
 
 #include <mutex>
+#include <new>
 
 #include <openssl/err.h>
 #include <openssl/evp.h>
@@ -31,6 +32,70 @@ namespace {
 
 const char kPluginId[] = "VL-Transport-1.0";
 
+// ---- Raw logs --------------------------------------------------------------------------------
+
+// The raw logs of one direction of a connection, without the secrets in it: the text content of
+// every element whose local name is "AuthToken" (the account's token, in every request's
+// settings block and in the authorisation's answer) or "password" (the account's password, sent
+// to remove all purchases) becomes "********"; every other byte is logged as it is. Blocks cut
+// the text anywhere, within a tag or a value too, so what the last block left open is kept.
+class RawLog {
+ public:
+  explicit RawLog(const int* area) : m_Area(area) {}
+
+  // A new message: nothing of an earlier one is open.
+  void Reset() {
+    m_InTag = m_InSecret = m_Masked = false;
+    m_Prev = 0;
+  }
+
+  void Write(const char* data, size_t n) {
+    VLString text;
+    for (const char* c = data; c < data + n; m_Prev = *c++) {
+      if (m_InSecret && *c != '<') {
+        if (!m_Masked) text += kMask;
+        m_Masked = true;
+        continue;
+      }
+      m_InSecret = false;
+      text += *c;
+      if (*c == '<') {
+        m_InTag = true;
+        m_Tag = VLString();
+      } else if (m_InTag && *c == '>') {
+        m_InTag = false;
+        m_InSecret = m_Prev != '/' && IsSecretName(m_Tag);
+        m_Masked = false;
+      } else if (m_InTag && m_Tag.length() < kNameLimit) {
+        m_Tag += *c;
+      }
+    }
+    VL_LogOutputwithLen(*m_Area, 4, text.c_str(), static_cast<int>(text.length()));
+  }
+
+ private:
+  static constexpr const char* kMask = "********";
+  static const size_t kNameLimit = 64;  // more than any name looked for, prefix included
+
+  // Whether the start of a tag's text (after its "<") names a secret element.
+  static bool IsSecretName(const VLString& tag) {
+    size_t length = strcspn(tag.c_str(), " \t\r\n/");
+    const char* colon = static_cast<const char*>(memrchr(tag.c_str(), ':', length));
+    const char* local = colon ? colon + 1 : tag.c_str();
+    size_t localLength = length - static_cast<size_t>(local - tag.c_str());
+    for (const char* secret : {"AuthToken", "password"})
+      if (localLength == strlen(secret) && memcmp(local, secret, localLength) == 0) return true;
+    return false;
+  }
+
+  const int* m_Area;  // one of the exported area ids, which are registered after construction
+  VLString m_Tag;     // the first bytes of the tag being read, after its "<"
+  bool m_InTag = false;
+  bool m_InSecret = false;  // within the value of a secret element
+  bool m_Masked = false;    // the mask of that value is written
+  char m_Prev = 0;          // the byte before the current one
+};
+
 // The context's callbacks that the transport replaced (it chains to them) and its settings.
 struct TransportData {
   SOAP_SOCKET (*fopen)(soap*, const char*, const char*, int);
@@ -39,6 +104,8 @@ struct TransportData {
   int (*fsend)(soap*, const char*, size_t);
   const char* userAgent;
   long long exchangeDeadline;  // of the exchange on the open connection (see ExchangeDeadline)
+  RawLog sent{&SENT_VLLogAreaID};
+  RawLog received{&RECV_VLLogAreaID};
 };
 
 TransportData* Data(soap* s) { return static_cast<TransportData*>(soap_lookup_plugin(s, kPluginId)); }
@@ -301,7 +368,10 @@ int StartTls(soap* s, int fd, const char* host) {
 // ---- Callbacks -------------------------------------------------------------------------------
 
 SOAP_SOCKET Open(soap* s, const char* endpoint, const char* host, int port) {
-  Data(s)->exchangeDeadline = ExchangeDeadline(s);
+  TransportData* d = Data(s);
+  d->exchangeDeadline = ExchangeDeadline(s);
+  d->sent.Reset();
+  d->received.Reset();
   bool tls = strncasecmp(endpoint, "https:", 6) == 0;
   bool proxy = s->proxy_host && *s->proxy_host;
   SOAP_SOCKET fd = proxy ? ConnectTcp(s, s->proxy_host, s->proxy_port) : ConnectTcp(s, host, port);
@@ -335,8 +405,9 @@ int PostHeader(soap* s, const char* key, const char* value) {
 }
 
 int Send(soap* s, const char* data, size_t n) {
-  VL_LogOutputwithLen(SENT_VLLogAreaID, 4, data, static_cast<int>(n));
-  return Data(s)->fsend(s, data, n);
+  TransportData* d = Data(s);
+  d->sent.Write(data, n);
+  return d->fsend(s, data, n);
 }
 
 // A receive that waited until its deadline: nothing, as from a peer that closed.
@@ -387,14 +458,14 @@ size_t RecvPlain(soap* s, char* buf, size_t n) {
 
 size_t Recv(soap* s, char* buf, size_t n) {
   size_t r = s->ssl ? RecvTls(s, buf, n) : RecvPlain(s, buf, n);
-  if (r > 0) VL_LogOutputwithLen(RECV_VLLogAreaID, 4, buf, static_cast<int>(r));
+  if (r > 0) Data(s)->received.Write(buf, r);
   return r;
 }
 
-void DeletePlugin(soap*, soap_plugin* p) { SOAP_FREE(NULL, p->data); }
+void DeletePlugin(soap*, soap_plugin* p) { delete static_cast<TransportData*>(p->data); }
 
 int Plugin(soap* s, soap_plugin* p, void*) {
-  TransportData* d = static_cast<TransportData*>(SOAP_MALLOC(s, sizeof(TransportData)));
+  TransportData* d = new (std::nothrow) TransportData;
   if (!d) return SOAP_EOM;
   d->fopen = s->fopen;
   d->fclose = s->fclose;

@@ -19,8 +19,9 @@
 //   made a 5 s receive time-out take twice as long.)
 // - HTTP headers: "User-Agent" is the configured text or "gSOAP/2.7"; "Accept-Encoding" is
 //   "gzip, deflate".
-// - every block of bytes sent or received is logged raw to "soap_sent" / "soap_recv" (level 4);
-//   connection traces go to "soap_test".
+// - every block of bytes sent or received is logged raw to "soap_sent" / "soap_recv" (level 4),
+//   except the values of the secret elements "AuthToken" and "password" (any namespace prefix),
+//   which read "********"; connection traces go to "soap_test".
 //
 // Any request made on the context (SOAP calls and plain HTTP requests over soap_connect_command,
 // fsend and frecv) takes this path.
