@@ -42,6 +42,7 @@ VL_WS_Status BoxArtDownloader::Download(const VLString& prefix, VL_WS_BoxArtSize
     target = VLString();
     Sink sink(&target);
     status = Fetch(prefix, size, ifModifiedSince, sink, &length, &lastModified);
+    if (status == VL_WS_OK && !VLUtilities::IsJpegImage(target)) status = VL_WS_E_NETWORK;
     if (status != VL_WS_OK) target = VLString();
   } else {
     VLString temporary = VLFile::CreateTempFileName(target.c_str());
@@ -53,6 +54,7 @@ VL_WS_Status BoxArtDownloader::Download(const VLString& prefix, VL_WS_BoxArtSize
       status = Fetch(prefix, size, ifModifiedSince, sink, &length, &lastModified);
     }
     if (!file.Close() && status == VL_WS_OK) status = VL_WS_E_FILE;
+    if (status == VL_WS_OK && !VLUtilities::IsJpegFile(temporary)) status = VL_WS_E_NETWORK;
     // rename replaces the destination in one step: a handle sharing the cache folder finds
     // either image, never none.
     if (status == VL_WS_OK && !VLFile::Rename(temporary.c_str(), target.c_str())) status = VL_WS_E_FILE;

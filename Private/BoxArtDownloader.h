@@ -4,8 +4,9 @@
 // connection callbacks of that handle's catalogue context (VLTransportConnection); the caller
 // decides about the context's HTTP proxy.
 //
-// The answer is read through one 2048-byte buffer: its whole header must come in the first piece
-// received (at most 2047 bytes); the body is then passed straight on to the file or the string.
+// The answer is read through one 2048-byte buffer: its whole header must fit into it (at most
+// 2047 bytes, however many pieces it comes in); the body is then passed straight on to the file
+// or the string.
 //
 // A download to a file writes a temporary file "vlws??????" beside the destination and renames
 // it over the destination only when the image is complete, so the destination is always either
@@ -34,7 +35,8 @@ class BoxArtDownloader {
   //   -2011  no connection to the image host;
   //   -1001  a send or receive failed, or the answer has not the expected form (no
   //          "Content-Length", a length below 1 or above kMaxContentLength, a header longer
-  //          than the first piece, an answer that ends early);
+  //          than 2047 bytes, an encoded body, an answer that ends early, a body that is
+  //          no JPEG image);
   //   -1901  the server answered "404 Not Found";
   //   -1902  the server answered "304 Not Modified" (the stored image is current);
   //   -1900  the temporary file could not be made or written, or not renamed to target.

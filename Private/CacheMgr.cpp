@@ -85,8 +85,12 @@ const char kOldestBoxArt[] = "SELECT Prefix, Dim FROM BoxArt ORDER BY TS ASC LIM
 const char kDeleteOldestBoxArt[] =
     "DELETE FROM BoxArt WHERE Prefix in (SELECT Prefix FROM BoxArt ORDER BY TS ASC LIMIT 10)";
 const char kBeginImmediate[] = "BEGIN IMMEDIATE";
+const char kBeginExclusive[] = "BEGIN EXCLUSIVE";
 const char kCommit[] = "COMMIT";
 const char kRollback[] = "ROLLBACK";
+
+// Results by which SQLite reports a database file it cannot read as one.
+bool IsDamage(int rc) { return rc == SQLITE_CORRUPT || rc == SQLITE_NOTADB; }
 
 // The Userdata key of a title's wishlist flag.
 VLString FlagKey(int titleID) {
@@ -100,7 +104,10 @@ VLString FlagKey(int titleID) {
 class CacheMgr::ScopedConnection {
  public:
   explicit ScopedConnection(CacheMgr& cache) : m_Cache(cache), m_Open(cache.OpenConnection() == SQLITE_OK) {}
-  ~ScopedConnection() { m_Cache.CloseConnection(false); }
+  ~ScopedConnection() {
+    if (m_Cache.m_Damaged) m_Cache.Recreate();
+    m_Cache.CloseConnection(false);
+  }
   bool IsOpen() const { return m_Open; }
 
  private:
@@ -113,6 +120,7 @@ CacheMgr::CacheMgr()
       m_CacheData(0),
       m_CacheLimit(0),
       m_Opened(false),
+      m_Damaged(false),
       m_DB(0),
       m_Stmt(0),
       m_MetaDataLimit(0),
@@ -125,6 +133,7 @@ CacheMgr::~CacheMgr() { Close(); }
 
 int CacheMgr::Open(const VL_WS_CacheParam2& params) {
   Close();
+  m_Damaged = false;
   m_CacheType = params.CacheType;
   m_CacheData = params.CacheData;
   m_CacheLimit = static_cast<unsigned int>(params.CacheLimit);
@@ -200,6 +209,25 @@ int CacheMgr::CloseConnection(bool force) {
   return rc;
 }
 
+bool CacheMgr::RemoveDatabaseFile(const VLString& path) {
+  // The journal goes first: left without its database, it would be played back into the new
+  // database of the same name as if it were that database's own.
+  VLFile::Remove((path + "-journal").c_str());
+  return VLFile::Remove(path.c_str());
+}
+
+// Under an exclusive lock, so that no other connection to the file is in the middle of an
+// operation on the database that goes.
+void CacheMgr::Recreate() {
+  if (m_CacheType == kFileCache) {
+    Execute(kBeginExclusive, 0, 0);
+    RemoveDatabaseFile(m_Path);
+  }
+  CloseConnection(true);
+  if (OpenConnection() == SQLITE_OK) CreateSchema();
+  m_Damaged = false;
+}
+
 int CacheMgr::CreateSchema() {
   for (const char* statement : kSchema) {
     int rc = Execute(statement, 0, 0);
@@ -217,7 +245,14 @@ bool CacheMgr::Caches(int kind) const { return m_Opened && (m_CacheData & kind) 
 
 int CacheMgr::Prepare(const char* sql) {
   Finalize();
-  return sqlite3_prepare_v2(m_DB, sql, -1, &m_Stmt, 0);
+  return Noted(sqlite3_prepare_v2(m_DB, sql, -1, &m_Stmt, 0));
+}
+
+int CacheMgr::Step() { return Noted(sqlite3_step(m_Stmt)); }
+
+int CacheMgr::Noted(int rc) {
+  if (IsDamage(rc)) m_Damaged = true;
+  return rc;
 }
 
 void CacheMgr::Finalize() {
@@ -246,7 +281,7 @@ int CacheMgr::Execute(const char* sql, VLString* text, unsigned int* number) {
   if (number != 0) *number = 0;
   int rc = Prepare(sql);
   if (rc == SQLITE_OK) {
-    rc = sqlite3_step(m_Stmt);
+    rc = Step();
     if (rc == SQLITE_ROW) {
       if (text != 0) ColumnText(0, *text);
       if (number != 0) *number = static_cast<unsigned int>(sqlite3_column_int64(m_Stmt, 0));
@@ -295,7 +330,7 @@ void CacheMgr::LimitHandler(int kind) {
     int count = 0;
     bool deleted = Prepare(kOldestBoxArt) == SQLITE_OK;
     int rc = SQLITE_DONE;
-    while (deleted && (rc = sqlite3_step(m_Stmt)) == SQLITE_ROW && count < kEvictionBatch) {
+    while (deleted && (rc = Step()) == SQLITE_ROW && count < kEvictionBatch) {
       ColumnText(0, prefixes[count++]);
     }
     Finalize();
@@ -328,7 +363,7 @@ bool CacheMgr::ReadNamedValue(int kind, const char* sql, const VLString& name, c
   if (!connection.IsOpen() || Prepare(sql) != SQLITE_OK) return false;
   BindText(1, name);
   BindText(2, key);
-  if (sqlite3_step(m_Stmt) != SQLITE_ROW) return false;
+  if (Step() != SQLITE_ROW) return false;
   ColumnText(0, value);
   return true;
 }
@@ -344,7 +379,7 @@ bool CacheMgr::WriteNamedValue(int kind, const char* sql, const VLString& name,
   BindText(2, key);
   BindText(3, value);
   sqlite3_bind_int(m_Stmt, 4, static_cast<int>(value.length()));
-  return sqlite3_step(m_Stmt) == SQLITE_DONE;
+  return Step() == SQLITE_DONE;
 }
 
 bool CacheMgr::ReadMetaData(const VLString& name, const VLString& key, VLString& value) {
@@ -374,7 +409,7 @@ bool CacheMgr::UpdateLastCacheLoadTime(const VLString& time) {
   if (stored == time) return true;
   if (Prepare(kWriteLoadTime) != SQLITE_OK) return false;
   BindText(1, time);
-  if (sqlite3_step(m_Stmt) != SQLITE_DONE) return false;
+  if (Step() != SQLITE_DONE) return false;
   return Execute(kDeleteService, 0, 0) == SQLITE_OK;
 }
 
@@ -389,7 +424,7 @@ bool CacheMgr::PurgeUserData(const VLString& name) {
     purged = Prepare(kDeleteUserdataByName) == SQLITE_OK;
     if (purged) {
       BindText(1, name);
-      purged = sqlite3_step(m_Stmt) == SQLITE_DONE;
+      purged = Step() == SQLITE_DONE;
     }
     Finalize();
   }
@@ -415,7 +450,7 @@ bool CacheMgr::WriteBoxArt(const VLString& prefix, VL_WS_BoxArtSize dim, unsigne
   BindText(4, lastModified);
   sqlite3_bind_int(m_Stmt, 5, static_cast<int>(needUpdate));
   sqlite3_bind_blob(m_Stmt, 6, data.c_str(), static_cast<int>(data.length()), SQLITE_STATIC);
-  return sqlite3_step(m_Stmt) == SQLITE_DONE;
+  return Step() == SQLITE_DONE;
 }
 
 bool CacheMgr::ReadBoxArt(const VLString& prefix, VL_WS_BoxArtSize dim, unsigned int& size,
@@ -429,7 +464,7 @@ bool CacheMgr::ReadBoxArt(const VLString& prefix, VL_WS_BoxArtSize dim, unsigned
   if (!connection.IsOpen() || Prepare(kSelectBoxArt) != SQLITE_OK) return false;
   BindText(1, prefix);
   sqlite3_bind_int(m_Stmt, 2, dim);
-  if (sqlite3_step(m_Stmt) != SQLITE_ROW) return false;
+  if (Step() != SQLITE_ROW) return false;
   size = static_cast<unsigned int>(sqlite3_column_int64(m_Stmt, 0));
   ColumnText(1, lastModified);
   needUpdate = static_cast<unsigned int>(sqlite3_column_int(m_Stmt, 2));
@@ -469,7 +504,7 @@ bool CacheMgr::WriteWishlistFlags(const VLWS_IntVector& titleIDs, const VLWS_Boo
     VLString key = FlagKey(titleIDs[i]);
     BindText(1, key);
     sqlite3_bind_text(m_Stmt, 2, flags[i] ? "1" : "0", 1, SQLITE_STATIC);
-    if (sqlite3_step(m_Stmt) != SQLITE_DONE) return false;
+    if (Step() != SQLITE_DONE) return false;
     sqlite3_reset(m_Stmt);
   }
   return true;
@@ -481,7 +516,7 @@ bool CacheMgr::RemoveWishlistFlag(int titleID) {
   if (!connection.IsOpen() || Prepare(kDeleteFlag) != SQLITE_OK) return false;
   VLString key = FlagKey(titleID);
   BindText(1, key);
-  return sqlite3_step(m_Stmt) == SQLITE_DONE;
+  return Step() == SQLITE_DONE;
 }
 
 bool CacheMgr::RemoveAllWishlistFlags() { return PurgeUserData(kWishlistFlag); }

@@ -9,6 +9,10 @@
 // per client handle, each used by one thread) can share the file: SQLite's file locks serialise
 // them, with a busy timeout of 10 seconds. A memory database lives from Open to Close and
 // belongs to its one object.
+//
+// A database that SQLite reports as damaged (corrupt, or not a database) in any operation is
+// deleted and made anew, empty, when that operation ends: the operation misses, the ones after
+// it work again. A cache must never keep answering from, or failing on, a damaged file.
 #ifndef CACHEMGR_H
 #define CACHEMGR_H
 
@@ -51,6 +55,10 @@ class CacheMgr : public CacheInterface {
   int ExecuteSQL(const VLString& sql, VLString& result);
   int ExecuteSQL(const VLString& sql, unsigned int& result);
 
+  // Deletes a cache database file with its rollback journal; true when the database file was
+  // there and is gone.
+  static bool RemoveDatabaseFile(const VLString& path);
+
   // The byte budgets of the three kinds after Open; 0 means no limit.
   unsigned int MetaDataLimit() const { return m_MetaDataLimit; }
   unsigned int BoxArtLimit() const { return m_BoxArtLimit; }
@@ -64,9 +72,14 @@ class CacheMgr : public CacheInterface {
   int OpenConnection();
   int CloseConnection(bool force);
   int CreateSchema();
+  // Replaces the damaged database with a new, empty one.
+  void Recreate();
   void LimitHandler(int kind);
 
+  // Prepare and Step note a result that reports a damaged database (see Recreate).
   int Prepare(const char* sql);
+  int Step();
+  int Noted(int rc);
   void Finalize();
   void BindText(int index, const VLString& text);
   void ColumnText(int index, VLString& text);
@@ -81,6 +94,7 @@ class CacheMgr : public CacheInterface {
   unsigned int m_CacheLimit;
   VLString m_Path;
   bool m_Opened;
+  bool m_Damaged;  // SQLite reported the database as damaged during the operation under way
   sqlite3* m_DB;
   sqlite3_stmt* m_Stmt;  // the statement of the operation under way
   unsigned int m_MetaDataLimit;

@@ -15,8 +15,12 @@
 #include "Serializer.h"
 #include "VLFile.h"
 #include "VLUtilities.h"
+#include "VLWSAELog.h"
 
 namespace {
+
+// The configuration extension's area: a settings file that had to be set aside is its concern.
+VLLogArea s_Log(VLWSAE_CFGLOG_AREA_NAME);
 
 const size_t kCheckLength = 4;
 
@@ -100,33 +104,34 @@ bool WriteAll(int fd, const char* data, size_t n) {
 }
 
 // Fills the new file temp with text and syncs it to disk. It gets the permissions and, where
-// the process may, the owner of the file it will replace; a new one the permissions fopen
-// would have given it.
-bool WriteNewFile(const VLString& temp, const VLString& replaced, const VLString& text) {
+// the process may, the owner of the file model (the one it replaces, or the one it is a copy
+// of); without that file, the permissions fopen would have given it. ownerOnly takes away every
+// permission of group and others.
+bool WriteNewFile(const VLString& temp, const VLString& model, const VLString& text, bool ownerOnly) {
   int fd = open(temp.c_str(), O_WRONLY | O_TRUNC | O_CLOEXEC);
   if (fd < 0) return false;
+  mode_t mode = 0666 & ~CurrentUmask();
   struct stat old;
-  if (stat(replaced.c_str(), &old) == 0) {
-    fchmod(fd, old.st_mode & 07777);
+  if (stat(model.c_str(), &old) == 0) {
+    mode = old.st_mode & 07777;
     if ((old.st_uid != geteuid() || old.st_gid != getegid()) &&
         fchown(fd, old.st_uid, old.st_gid) != 0) {
       // Only a privileged process may give a file away; the new file stays the process's own.
     }
-  } else {
-    fchmod(fd, 0666 & ~CurrentUmask());
   }
+  fchmod(fd, ownerOnly ? mode & ~077 : mode);
   bool written = WriteAll(fd, text.c_str(), text.length()) && fsync(fd) == 0;
   return close(fd) == 0 && written;
 }
 
-// Replaces the content of the file at path with text, so that at every moment the file holds
-// either its old or its new content: a new file in the same folder is written and synced, then
-// renamed over the old one. False (old file untouched) on any failure.
-bool ReplaceFile(const VLString& path, const VLString& text) {
-  VLString replaced = ReplacedPath(path);
+// Replaces the content of the file replaced (a path from ReplacedPath) with text, so that at
+// every moment the file holds either its old or its new content: a new file in the same folder
+// is written and synced, then renamed over the old one. It takes model's permissions (see
+// WriteNewFile). False (old file untouched) on any failure.
+bool ReplaceFile(const VLString& replaced, const VLString& model, const VLString& text, bool ownerOnly) {
   VLString temp = VLFile::CreateTempFileName(replaced.c_str());
   if (temp.empty()) return false;
-  if (!WriteNewFile(temp, replaced, text) || rename(temp.c_str(), replaced.c_str()) != 0) {
+  if (!WriteNewFile(temp, model, text, ownerOnly) || rename(temp.c_str(), replaced.c_str()) != 0) {
     unlink(temp.c_str());
     return false;
   }
@@ -141,24 +146,34 @@ bool ReplaceFile(const VLString& path, const VLString& text) {
   return true;
 }
 
+// Keeps the bytes of the settings file replaced, which does not parse, beside it before it is
+// overwritten: whatever it still holds (the account's token) can then be recovered by hand.
+bool KeepDamaged(const VLString& replaced, const VLString& bytes) {
+  VLString kept = replaced + ".damaged";
+  bool done = ReplaceFile(kept, replaced, bytes, false);
+  VLLogOutputwithConfig({s_Log.Id(), 1}, "CfgXMLFile::Write %s cannot be read: %s %s\n", replaced.c_str(),
+                        done ? "its bytes are kept in" : "it is left as it is, it could not be kept in", kept.c_str());
+  return done;
+}
+
 }  // namespace
 
 CfgXMLFile::CfgXMLFile(const VLString& filename) : m_FileName(filename) {}
 
 CfgXMLFile::~CfgXMLFile() {}
 
-CfgXMLFile::Result CfgXMLFile::Load(Serializer& serializer,
-                                    VL1__ArrayOfConfigurationItemOfString& settings) const {
+CfgXMLFile::Loaded CfgXMLFile::Load(Serializer& serializer, VL1__ArrayOfConfigurationItemOfString& settings,
+                                    VLString& text) const {
   VLFile file;
-  if (!file.Open(m_FileName.c_str(), "rb")) return CFG_FILE_ERROR;
+  if (!file.Open(m_FileName.c_str(), "rb")) return errno == ENOENT ? NO_FILE : READ_ERROR;
   vl_int64 size = file.GetSize();
-  if (size == 0) return CFG_NOT_FOUND;
-  if (size < 0 || static_cast<uint64_t>(size) > VLString::npos) return CFG_FILE_ERROR;
+  if (size == 0) return EMPTY_FILE;
+  if (size < 0 || static_cast<uint64_t>(size) > VLString::npos) return READ_ERROR;
   std::vector<char> bytes(static_cast<size_t>(size));
-  if (file.Read(bytes.data(), size) != size) return CFG_FILE_ERROR;
-  serializer.SetXML(VLString(bytes.data(), bytes.size()));
-  serializer.Get(settings);  // text that does not parse leaves settings at its defaults: empty
-  return CFG_OK;
+  if (file.Read(bytes.data(), size) != size) return READ_ERROR;
+  text.assign(bytes.data(), bytes.size());
+  serializer.SetXML(text);
+  return serializer.Get(settings) == SOAP_OK ? LOADED : NOT_PARSED;
 }
 
 CfgXMLFile::Result CfgXMLFile::Read(const VLString& key, VLString& value, bool encrypted) {
@@ -166,8 +181,18 @@ CfgXMLFile::Result CfgXMLFile::Read(const VLString& key, VLString& value, bool e
   if (key.empty()) return CFG_EMPTY_KEY;
   std::unique_ptr<Serializer> serializer(new Serializer(false, false));
   VL1__ArrayOfConfigurationItemOfString settings;
-  Result loaded = Load(*serializer, settings);
-  if (loaded != CFG_OK) return loaded;
+  VLString text;
+  switch (Load(*serializer, settings, text)) {
+    case LOADED:
+      break;
+    case EMPTY_FILE:
+      return CFG_NOT_FOUND;
+    case NOT_PARSED:
+      return CFG_UNREADABLE;
+    case NO_FILE:
+    case READ_ERROR:
+      return CFG_FILE_ERROR;
+  }
   const VL1__ConfigurationItemOfString* setting = FindSetting(settings, key);
   if (!setting) return CFG_NOT_FOUND;
   VLString stored(setting->Value ? setting->Value : "");
@@ -187,7 +212,9 @@ CfgXMLFile::Result CfgXMLFile::Write(const VLString& key, const VLString& value,
   if (key.empty()) return CFG_EMPTY_KEY;
   std::unique_ptr<Serializer> serializer(new Serializer(false, true));
   VL1__ArrayOfConfigurationItemOfString settings;
-  Load(*serializer, settings);  // a file that cannot be loaded counts as one without settings
+  VLString text;
+  Loaded loaded = Load(*serializer, settings, text);
+  if (loaded == READ_ERROR) return CFG_FILE_ERROR;
   VLString stored = value;
   if (encrypted) {
     EVPCipher cipher(EVPCipher::AES_128_CBC);
@@ -202,7 +229,9 @@ CfgXMLFile::Result CfgXMLFile::Write(const VLString& key, const VLString& value,
   if (!setting) return CFG_FILE_ERROR;
   setting->Value = soap_strdup(serializer.get(), stored.c_str());
   if (serializer->Put(settings) != SOAP_OK) return CFG_FILE_ERROR;
-  return ReplaceFile(m_FileName, serializer->GetXML()) ? CFG_OK : CFG_FILE_ERROR;
+  VLString replaced = ReplacedPath(m_FileName);
+  if (loaded == NOT_PARSED && !KeepDamaged(replaced, text)) return CFG_FILE_ERROR;
+  return ReplaceFile(replaced, replaced, serializer->GetXML(), encrypted) ? CFG_OK : CFG_FILE_ERROR;
 }
 
 VLString CfgXMLFile::PackEncryptedValue(const VLString& cipherText, const VLString& password) {

@@ -29,6 +29,7 @@ class CfgXMLFile {
     CFG_FILE_ERROR = 2,  // cannot be opened or read; or cannot be created or fully written
     CFG_NOT_FOUND = 3,   // Read: the file is empty, holds no settings, or has none with the key
     CFG_DAMAGED = 4,     // Read: an encrypted value is too short, fails its check or its cipher
+    CFG_UNREADABLE = 5,  // Read: the file does not parse as a settings file (cut short, garbage)
   };
 
   explicit CfgXMLFile(const VLString& filename);
@@ -38,11 +39,15 @@ class CfgXMLFile {
   // CFG_OK. An encrypted read of an empty stored value gives CFG_OK with an empty value.
   Result Read(const VLString& key, VLString& value, bool encrypted);
   // Replaces the value of the first setting with key in place, or appends a new setting;
-  // CFG_OK, CFG_EMPTY_KEY or CFG_FILE_ERROR. A missing, empty or unparsable file counts as one
-  // without settings. The file is replaced whole: written to a temporary file in its folder,
-  // synced to disk and renamed over it, so a crash or a full disk leaves either the old or the
-  // new file, never a mixture. A symbolic link stays a link to the replaced file; the file keeps
-  // its permissions. Its folder must exist.
+  // CFG_OK, CFG_EMPTY_KEY or CFG_FILE_ERROR. A missing or empty file counts as one without
+  // settings; a file that exists but cannot be read is left alone (CFG_FILE_ERROR). A file that
+  // does not parse may still hold the account's token, so it is never overwritten: its bytes are
+  // first kept beside it as "<name>.damaged" (replacing an older one, with the same
+  // permissions; logged), then a new file holds the one setting. The file is replaced whole:
+  // written to a temporary file in its folder, synced to disk and renamed over it, so a crash or
+  // a full disk leaves either the old or the new file, never a mixture. A symbolic link stays a
+  // link to the replaced file; the file keeps its permissions, except that an encrypted write
+  // leaves it readable and writable by its owner only. Its folder must exist.
   Result Write(const VLString& key, const VLString& value, bool encrypted);
 
   // password + cipherText + four check digits: the last four decimal digits of
@@ -55,10 +60,12 @@ class CfgXMLFile {
                                      VLString& cipherText);
 
  private:
-  // Reads and parses the file into settings, which then live in serializer's memory: CFG_OK,
-  // CFG_FILE_ERROR (cannot be opened or read) or CFG_NOT_FOUND (zero bytes). Text that does not
-  // parse leaves settings empty.
-  Result Load(Serializer& serializer, VL1__ArrayOfConfigurationItemOfString& settings) const;
+  // What Load found.
+  enum Loaded { LOADED, NO_FILE, EMPTY_FILE, READ_ERROR, NOT_PARSED };
+  // Reads the file into text and parses it into settings, which then live in serializer's
+  // memory. Settings stay empty unless the result is LOADED.
+  Loaded Load(Serializer& serializer, VL1__ArrayOfConfigurationItemOfString& settings,
+              VLString& text) const;
 
   VLString m_FileName;
 };

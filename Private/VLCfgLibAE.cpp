@@ -305,7 +305,12 @@ bool VLCfgLibAE::checkXMLVersion(const char* version) {
 void VLCfgLibAE::checkXMLupgrade() {
   VLWSAELog trace("VLCfgLibAE", "checkXMLupgrade", s_Log.Id());
   AEString settingsVersion, configVersion;
-  ReadSetting(m_SettingsFile, kXMLVersion, false, settingsVersion);
+  if (ReadSetting(m_SettingsFile, kXMLVersion, false, settingsVersion) == VL_WS_E_SETTING_UNREADABLE) {
+    // Rebuilding would lose the token and the device's identifier that the file may still hold.
+    VLLogOutputwithConfig(Error(), "VLCfgLibAE::checkXMLupgrade Error: SettingsFile(%s) cannot be read; it is not upgraded.\n",
+        m_SettingsFile.CString());
+    return;
+  }
   ReadSetting(m_ConfigurationFile, kXMLVersion, false, configVersion);
   for (const AEString* version : {&settingsVersion, &configVersion}) {
     if (!checkXMLVersion(version->CString())) {

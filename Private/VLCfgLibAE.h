@@ -37,7 +37,8 @@ class VLCfgLibAE : public ae::stagecraft::ASExtensionClass {
   bool EnvSettingsFile(const char* method, int env, AEString& path) const;
   // When the configuration file names a newer "XMLVersion" than the settings file (or the
   // settings file names none), rebuilds the settings file with only that version, the
-  // account's token and the device identifier.
+  // account's token and the device identifier. A settings file that cannot be read is left as
+  // it is (logged): rebuilding it would lose the token and identifier it may still hold.
   void checkXMLupgrade();
   // Whether version is empty or a text of digits and single dots.
   static bool checkXMLVersion(const char* version);

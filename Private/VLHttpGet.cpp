@@ -74,7 +74,13 @@ VLHttpGet::Result VLHttpGet::Run(const char* url, const char* host, int port, co
   if (!m_Connection.Open(url, host, port)) return HTTP_CONNECT_FAILED;
   Result result = HTTP_SEND_FAILED;
   if (m_Connection.Send(request.c_str(), request.length())) {
-    m_Received = m_Connection.Receive(m_Piece, kPieceSize - 1);
+    // TCP may cut the header anywhere: read on until it ends, the buffer is full or the
+    // connection ends (the transport's deadline included).
+    while (m_Received < kPieceSize - 1 && !memmem(m_Piece, m_Received, "\r\n\r\n", 4)) {
+      size_t got = m_Connection.Receive(m_Piece + m_Received, kPieceSize - 1 - m_Received);
+      if (got == 0) break;
+      m_Received += got;
+    }
     m_Piece[m_Received] = 0;
     result = m_Received == 0 ? HTTP_NOTHING_RECEIVED : ReadHeader();
   }
@@ -91,6 +97,9 @@ VLHttpGet::Result VLHttpGet::ReadHeader() {
   VLString length;
   if (m_HeaderEnd == 0 || !Field("Content-Length", &length) || !ParseNumber(length, 18, &m_ContentLength))
     return HTTP_BAD_ANSWER;
+  // The requests ask for no encoding: an encoded body is not the one they can read.
+  VLString encoding;
+  if (Field("Content-Encoding", &encoding) && strcasecmp(encoding.c_str(), "identity") != 0) return HTTP_BAD_ANSWER;
   m_Body = m_HeaderEnd + 4;
   m_BodyReceived = static_cast<size_t>(m_Piece + m_Received - m_Body);
   if (m_BodyReceived > m_ContentLength) {
@@ -121,5 +130,19 @@ bool VLHttpGet::Field(const char* name, VLString* value) const {
 }
 
 size_t VLHttpGet::Receive(char* buffer, size_t n) { return m_Connection.Receive(buffer, n); }
+
+bool VLHttpGet::ReceiveBody() {
+  if (m_Body == 0) return false;
+  char* body = m_Piece + (m_Body - m_Piece);
+  if (m_ContentLength > static_cast<uint64_t>(m_Piece + kPieceSize - 1 - body)) return false;
+  while (m_BodyReceived < m_ContentLength) {
+    size_t got = m_Connection.Receive(body + m_BodyReceived, static_cast<size_t>(m_ContentLength) - m_BodyReceived);
+    if (got == 0) return false;
+    m_BodyReceived += got;
+    m_Received += got;
+  }
+  body[m_BodyReceived] = 0;
+  return true;
+}
 
 void VLHttpGet::Close() { m_Connection.Close(); }

@@ -1,10 +1,11 @@
-// VLHttpGet: one small hand-built HTTP/1.1 request of the library (the server time, the bandwidth
-// probe, box-art images) over the connection of a SOAP context (VLTransportConnection): send the
-// request, receive the first piece of the answer once, check its status line and
-// "Content-Length", and find the body. A body longer than the first piece is read on with Receive.
+// VLHttpGet: one small hand-built HTTP/1.1 request of the library (the device environment, the
+// server time, the bandwidth probe, box-art images) over the connection of a SOAP context
+// (VLTransportConnection): send the request, receive the first piece of the answer, up to the end
+// of its header however TCP cuts it, check its status line and "Content-Length", and find the
+// body. The rest of the body is read with ReceiveBody (small bodies) or Receive.
 //
 // The answer must start with "HTTP/1.1 200 OK\r\n" (or one of the other statuses of Result),
-// and its whole header, with a "Content-Length" above 0, must come in the first piece. The
+// and its whole header, with a "Content-Length" above 0, must fit into the first piece. The
 // connection is closed by Close or the destructor.
 #ifndef VLHTTPGET_H
 #define VLHTTPGET_H
@@ -32,11 +33,12 @@ class VLHttpGet {
     HTTP_NOTHING_RECEIVED,  // the peer closed, the receive time-out passed or the receive failed
     HTTP_NOT_FOUND,         // "HTTP/1.1 404 Not Found"
     HTTP_NOT_MODIFIED,      // "HTTP/1.1 304 Not Modified"
-    HTTP_BAD_ANSWER,        // another status, no Content-Length above 0, or a header cut short
+    HTTP_BAD_ANSWER,        // another status, no Content-Length above 0, a Content-Encoding
+                            // other than "identity", or a header cut short
   };
 
-  // The first piece of an answer is received into a buffer of this size (one byte is kept for
-  // the terminator).
+  // The first piece of an answer, the whole header and what came with it, is received into a
+  // buffer of this size (one byte is kept for the terminator).
   static const size_t kPieceSize = 2048;
 
   // Splits url: false when it has no "//", no "/" after the host, an empty host or path, or a
@@ -64,6 +66,10 @@ class VLHttpGet {
   // One more receive of at most n bytes of the body: the count received, 0 when the connection
   // ended, the receive time-out passed or the receive failed.
   size_t Receive(char* buffer, size_t n);
+  // After HTTP_OK: receives the rest of a body that fits into the first piece's buffer, so that
+  // Body() holds all ContentLength bytes (terminated). False when it does not fit or the
+  // connection ended before.
+  bool ReceiveBody();
   void Close();
 
  private:

@@ -16,6 +16,7 @@
 #include <unistd.h>
 
 #include <mutex>
+#include <new>
 
 #include <openssl/err.h>
 #include <openssl/evp.h>
@@ -31,28 +32,116 @@ namespace {
 
 const char kPluginId[] = "VL-Transport-1.0";
 
+// ---- Raw logs --------------------------------------------------------------------------------
+
+// The raw logs of one direction of a connection, without the secrets in it: the text content of
+// every element whose local name is "AuthToken" (the account's token, in every request's
+// settings block and in the authorisation's answer) or "password" (the account's password, sent
+// to remove all purchases) becomes "********"; every other byte is logged as it is. Blocks cut
+// the text anywhere, within a tag or a value too, so what the last block left open is kept.
+class RawLog {
+ public:
+  explicit RawLog(const int* area) : m_Area(area) {}
+
+  // A new message: nothing of an earlier one is open.
+  void Reset() {
+    m_InTag = m_InSecret = m_Masked = false;
+    m_Prev = 0;
+  }
+
+  void Write(const char* data, size_t n) {
+    VLString text;
+    for (const char* c = data; c < data + n; m_Prev = *c++) {
+      if (m_InSecret && *c != '<') {
+        if (!m_Masked) text += kMask;
+        m_Masked = true;
+        continue;
+      }
+      m_InSecret = false;
+      text += *c;
+      if (*c == '<') {
+        m_InTag = true;
+        m_Tag = VLString();
+      } else if (m_InTag && *c == '>') {
+        m_InTag = false;
+        m_InSecret = m_Prev != '/' && IsSecretName(m_Tag);
+        m_Masked = false;
+      } else if (m_InTag && m_Tag.length() < kNameLimit) {
+        m_Tag += *c;
+      }
+    }
+    VL_LogOutputwithLen(*m_Area, 4, text.c_str(), static_cast<int>(text.length()));
+  }
+
+ private:
+  static constexpr const char* kMask = "********";
+  static const size_t kNameLimit = 64;  // more than any name looked for, prefix included
+
+  // Whether the start of a tag's text (after its "<") names a secret element.
+  static bool IsSecretName(const VLString& tag) {
+    size_t length = strcspn(tag.c_str(), " \t\r\n/");
+    const char* colon = static_cast<const char*>(memrchr(tag.c_str(), ':', length));
+    const char* local = colon ? colon + 1 : tag.c_str();
+    size_t localLength = length - static_cast<size_t>(local - tag.c_str());
+    for (const char* secret : {"AuthToken", "password"})
+      if (localLength == strlen(secret) && memcmp(local, secret, localLength) == 0) return true;
+    return false;
+  }
+
+  const int* m_Area;  // one of the exported area ids, which are registered after construction
+  VLString m_Tag;     // the first bytes of the tag being read, after its "<"
+  bool m_InTag = false;
+  bool m_InSecret = false;  // within the value of a secret element
+  bool m_Masked = false;    // the mask of that value is written
+  char m_Prev = 0;          // the byte before the current one
+};
+
 // The context's callbacks that the transport replaced (it chains to them) and its settings.
 struct TransportData {
   SOAP_SOCKET (*fopen)(soap*, const char*, const char*, int);
   int (*fclose)(soap*);
   int (*fposthdr)(soap*, const char*, const char*);
   int (*fsend)(soap*, const char*, size_t);
-  size_t (*frecv)(soap*, char*, size_t);
   const char* userAgent;
+  long long exchangeDeadline;  // of the exchange on the open connection (see ExchangeDeadline)
+  RawLog sent{&SENT_VLLogAreaID};
+  RawLog received{&RECV_VLLogAreaID};
 };
 
 TransportData* Data(soap* s) { return static_cast<TransportData*>(soap_lookup_plugin(s, kPluginId)); }
 
 // ---- Time-outs -------------------------------------------------------------------------------
 
-// gSOAP time-outs: > 0 seconds, < 0 microseconds, 0 none. Returns a deadline in ms of
-// CLOCK_MONOTONIC, or -1 for none.
-long long Deadline(int timeout) {
-  if (timeout == 0) return -1;
-  long long ms = timeout > 0 ? timeout * 1000LL : (-static_cast<long long>(timeout) + 999) / 1000;
+// Deadlines are milliseconds of CLOCK_MONOTONIC; -1 is none.
+long long Now() {
   timespec now;
   clock_gettime(CLOCK_MONOTONIC, &now);
-  return now.tv_sec * 1000LL + now.tv_nsec / 1000000 + ms;
+  return now.tv_sec * 1000LL + now.tv_nsec / 1000000;
+}
+
+// A gSOAP time-out (> 0 seconds, < 0 microseconds, 0 none) in milliseconds.
+long long TimeoutMs(int timeout) {
+  return timeout >= 0 ? timeout * 1000LL : (-static_cast<long long>(timeout) + 999) / 1000;
+}
+
+long long Earlier(long long a, long long b) {
+  if (a < 0) return b;
+  if (b < 0) return a;
+  return a < b ? a : b;
+}
+
+// The deadline of one wait of the given time-out, never after the exchange's.
+long long Deadline(soap* s, int timeout) {
+  return Earlier(timeout == 0 ? -1 : Now() + TimeoutMs(timeout), Data(s)->exchangeDeadline);
+}
+
+// The time-outs bound each single wait, so an answer that trickles in (a byte now and then)
+// would never end. The whole exchange on a connection, from connecting to the last byte of the
+// answer, therefore ends within the send and the receive time-out together: 118 s with the
+// handles' 30 and 88. Without a receive time-out there is no deadline.
+long long ExchangeDeadline(const soap* s) {
+  if (s->recv_timeout == 0) return -1;
+  return Now() + TimeoutMs(s->send_timeout) + TimeoutMs(s->recv_timeout);
 }
 
 // Waits until fd is ready for events or the deadline passes. Returns 1 ready, 0 time-out, -1
@@ -61,9 +150,7 @@ int WaitSocket(int fd, short events, long long deadline) {
   for (;;) {
     int wait = -1;
     if (deadline >= 0) {
-      timespec now;
-      clock_gettime(CLOCK_MONOTONIC, &now);
-      long long left = deadline - (now.tv_sec * 1000LL + now.tv_nsec / 1000000);
+      long long left = deadline - Now();
       if (left <= 0) return 0;
       wait = left > INT_MAX ? INT_MAX : static_cast<int>(left);
     }
@@ -120,7 +207,7 @@ SOAP_SOCKET ConnectTcp(soap* s, const char* host, int port) {
     soap_set_receiver_error(s, "Host not found", "getaddrinfo failed in VLSoapTransport", SOAP_TCP_ERROR);
     return SOAP_INVALID_SOCKET;
   }
-  long long deadline = Deadline(s->connect_timeout);
+  long long deadline = Deadline(s, s->connect_timeout);
   int fd = -1, err = 0;
   for (const addrinfo* ai = res; ai && fd < 0; ai = ai->ai_next) fd = ConnectOne(ai, deadline, &err);
   freeaddrinfo(res);
@@ -138,7 +225,7 @@ SOAP_SOCKET ConnectTcp(soap* s, const char* host, int port) {
 
 // Sends all n bytes on a connected socket within the send time-out.
 bool SendAll(soap* s, int fd, const char* data, size_t n) {
-  long long deadline = Deadline(s->send_timeout);
+  long long deadline = Deadline(s, s->send_timeout);
   while (n > 0) {
     ssize_t r = send(fd, data, n, MSG_NOSIGNAL);
     if (r > 0) {
@@ -189,7 +276,7 @@ int ProxyConnect(soap* s, int fd, const char* host, int port) {
   // The proxy says nothing after its header until TLS starts, so reading past it is safe.
   char reply[4096];
   size_t got = 0;
-  long long deadline = Deadline(s->recv_timeout);
+  long long deadline = Deadline(s, s->recv_timeout);
   for (;;) {
     reply[got] = '\0';
     if (strstr(reply, "\r\n\r\n")) break;
@@ -256,7 +343,7 @@ int StartTls(soap* s, int fd, const char* host) {
     }
     SSL_set_verify(ssl, SSL_VERIFY_PEER, SSL_CTX_get_verify_callback(s->ctx));
   }
-  long long deadline = Deadline(s->connect_timeout);
+  long long deadline = Deadline(s, s->connect_timeout);
   for (;;) {
     int r = SSL_connect(ssl);
     if (r == 1) break;
@@ -281,6 +368,10 @@ int StartTls(soap* s, int fd, const char* host) {
 // ---- Callbacks -------------------------------------------------------------------------------
 
 SOAP_SOCKET Open(soap* s, const char* endpoint, const char* host, int port) {
+  TransportData* d = Data(s);
+  d->exchangeDeadline = ExchangeDeadline(s);
+  d->sent.Reset();
+  d->received.Reset();
   bool tls = strncasecmp(endpoint, "https:", 6) == 0;
   bool proxy = s->proxy_host && *s->proxy_host;
   SOAP_SOCKET fd = proxy ? ConnectTcp(s, s->proxy_host, s->proxy_port) : ConnectTcp(s, host, port);
@@ -314,13 +405,21 @@ int PostHeader(soap* s, const char* key, const char* value) {
 }
 
 int Send(soap* s, const char* data, size_t n) {
-  VL_LogOutputwithLen(SENT_VLLogAreaID, 4, data, static_cast<int>(n));
-  return Data(s)->fsend(s, data, n);
+  TransportData* d = Data(s);
+  d->sent.Write(data, n);
+  return d->fsend(s, data, n);
+}
+
+// A receive that waited until its deadline: nothing, as from a peer that closed.
+size_t ReceiveTimedOut(soap* s) {
+  s->errnum = 0;
+  VLLogOutputwithConfig({TEST_VLLogAreaID, 1}, "Receive time-out\n");
+  return 0;
 }
 
 // One read over TLS: at most one recv_timeout of waiting for data, however the records come.
 size_t RecvTls(soap* s, char* buf, size_t n) {
-  long long deadline = Deadline(s->recv_timeout);
+  long long deadline = Deadline(s, s->recv_timeout);
   int fd = s->socket;
   for (;;) {
     ERR_clear_error();
@@ -333,31 +432,47 @@ size_t RecvTls(soap* s, char* buf, size_t n) {
       return 0;
     }
     int w = WaitSocket(fd, events, deadline);
-    if (w <= 0) {
-      s->errnum = w == 0 ? 0 : errno;
-      if (w == 0) VLLogOutputwithConfig({TEST_VLLogAreaID, 1}, "Receive time-out\n");
+    if (w == 0) return ReceiveTimedOut(s);
+    if (w < 0) {
+      s->errnum = errno;
       return 0;
     }
   }
 }
 
+// One read of a plain connection: at most one recv_timeout of waiting for data.
+size_t RecvPlain(soap* s, char* buf, size_t n) {
+  long long deadline = Deadline(s, s->recv_timeout);
+  for (;;) {
+    int w = WaitSocket(s->socket, POLLIN, deadline);
+    if (w == 0) return ReceiveTimedOut(s);
+    if (w > 0) {
+      ssize_t r = recv(s->socket, buf, n, 0);
+      if (r >= 0) return static_cast<size_t>(r);
+      if (errno == EINTR || errno == EAGAIN || errno == EWOULDBLOCK) continue;
+    }
+    s->errnum = errno;
+    return 0;
+  }
+}
+
 size_t Recv(soap* s, char* buf, size_t n) {
-  size_t r = s->ssl ? RecvTls(s, buf, n) : Data(s)->frecv(s, buf, n);
-  if (r > 0) VL_LogOutputwithLen(RECV_VLLogAreaID, 4, buf, static_cast<int>(r));
+  size_t r = s->ssl ? RecvTls(s, buf, n) : RecvPlain(s, buf, n);
+  if (r > 0) Data(s)->received.Write(buf, r);
   return r;
 }
 
-void DeletePlugin(soap*, soap_plugin* p) { SOAP_FREE(NULL, p->data); }
+void DeletePlugin(soap*, soap_plugin* p) { delete static_cast<TransportData*>(p->data); }
 
 int Plugin(soap* s, soap_plugin* p, void*) {
-  TransportData* d = static_cast<TransportData*>(SOAP_MALLOC(s, sizeof(TransportData)));
+  TransportData* d = new (std::nothrow) TransportData;
   if (!d) return SOAP_EOM;
   d->fopen = s->fopen;
   d->fclose = s->fclose;
   d->fposthdr = s->fposthdr;
   d->fsend = s->fsend;
-  d->frecv = s->frecv;
   d->userAgent = NULL;
+  d->exchangeDeadline = -1;
   p->id = kPluginId;
   p->data = d;
   p->fcopy = NULL;

@@ -9,14 +9,19 @@
 // - TLS writes go through a socket BIO that sends with MSG_NOSIGNAL, so a peer that hangs up
 //   gives an error result and never a SIGPIPE (plain sockets get the same flag through the
 //   context's socket_flags, set by the service objects).
-// - receive over TLS: one wait of at most recv_timeout for data, however the TLS records are cut.
+// - receive: one wait of at most recv_timeout for data, however the TLS records are cut.
+// - deadline: the whole exchange on a connection (connect, TLS handshake, request and answer)
+//   ends within send_timeout and recv_timeout together, so that an answer trickling in a byte
+//   at a time cannot hold a call for longer; a receive that reaches the deadline returns
+//   nothing, as one that reaches its receive time-out does.
 // - close: a TLS connection sends its close_notify and is closed at once. (gSOAP's own close
 //   then waits up to 5 s for the peer's close_notify, which put 5 s on every failed call and
 //   made a 5 s receive time-out take twice as long.)
 // - HTTP headers: "User-Agent" is the configured text or "gSOAP/2.7"; "Accept-Encoding" is
 //   "gzip, deflate".
-// - every block of bytes sent or received is logged raw to "soap_sent" / "soap_recv" (level 4);
-//   connection traces go to "soap_test".
+// - every block of bytes sent or received is logged raw to "soap_sent" / "soap_recv" (level 4),
+//   except the values of the secret elements "AuthToken" and "password" (any namespace prefix),
+//   which read "********"; connection traces go to "soap_test".
 //
 // Any request made on the context (SOAP calls and plain HTTP requests over soap_connect_command,
 // fsend and frecv) takes this path.

@@ -16,6 +16,14 @@ size_t AllocationFor(size_t n) {
   return (n + 8) & ~static_cast<size_t>(7);
 }
 
+// The capacity to allocate when a text of n bytes no longer fits into capacity: half as much
+// again when that covers n, so that a text growing in small pieces (a character at a time) is
+// copied only a logarithmic number of times; otherwise exactly what n needs.
+size_t GrownCapacity(size_t capacity, size_t n) {
+  size_t grown = (capacity / 2 > n / 3) ? capacity + capacity / 2 : n;
+  return grown > kMaxLength ? kMaxLength : grown;
+}
+
 }  // namespace
 
 struct VLString::Rep {
@@ -93,11 +101,7 @@ VLString& VLString::assign(const char* buf, size_t n) {
   VL_ASSERT(buf != 0);
   size_t cap = m_Rep->capacity;
   if (n > cap) {
-    // Grow by half when that covers n, so that repeated assigns of slowly growing texts do not
-    // reallocate every time; otherwise take exactly what n needs.
-    size_t grown = (cap / 2 > n / 3) ? cap + cap / 2 : n;
-    if (grown > kMaxLength) grown = kMaxLength;
-    Rep* fresh = new Rep(grown);
+    Rep* fresh = new Rep(GrownCapacity(cap, n));
     fresh->Set(buf, n);  // buf may still point into the old buffer: copy before freeing it
     delete m_Rep;
     m_Rep = fresh;
@@ -114,7 +118,7 @@ VLString& VLString::append(const char* buf, size_t n) {
   VL_ASSERT(n <= kMaxLength - oldLength);
   size_t newLength = oldLength + n;
   if (newLength > m_Rep->capacity) {
-    Rep* fresh = new Rep(newLength);
+    Rep* fresh = new Rep(GrownCapacity(m_Rep->capacity, newLength));
     memcpy(fresh->data, m_Rep->data, oldLength);
     memcpy(fresh->data + oldLength, buf, n);  // before the old buffer (maybe holding buf) goes
     delete m_Rep;

@@ -3,8 +3,9 @@
 // (a string built from a buffer and a length keeps them, and length() counts them).
 //
 // Allocation: a string of length n occupies the smallest multiple of 8 bytes above n (capacity is
-// that size minus one). assign() grows by half of the old capacity when that is enough, else to
-// the requested size; append() reallocates to the exact size that fits.
+// that size minus one). assign() and append() grow by half of the old capacity when that is
+// enough, else to the requested size, so that a text built a character at a time costs time in
+// proportion to its length.
 #ifndef VLSTRING_H
 #define VLSTRING_H
 

@@ -189,6 +189,12 @@ class VLUtilities {
   // word>.jpg" with the prefix URL-encoded, and the absolute URL "http://<image host><path>".
   static VLString GetBoxArtImagePath(const char* boxartprefix, VL_WS_BoxArtSize size);
   static VLString GetBoxArtImageURL(const char* boxartprefix, VL_WS_BoxArtSize size);
+  // Whether bytes, or the whole content of a file, can be a complete JPEG image: they begin with
+  // its start-of-image marker and end with its end-of-image marker. Box art is kept and answered
+  // from the cache only when it is one, so that an error page, a compressed or a cut body never
+  // passes for the image.
+  static bool IsJpegImage(const VLString& bytes);
+  static bool IsJpegFile(const VLString& filename);
   // Gives an image record (kind 0) its own copy of data's bytes, releasing bytes it held; empty
   // data leaves it without bytes (null, length 0).
   static void SetImageByData(VL_WS_Image& image, const VLString& data);

@@ -1,6 +1,7 @@
 // Box art and images: the size words of box-art images, where the image host serves them, the
 // names of their cache files, and the image record.
 #include <limits.h>
+#include <stdio.h>
 #include <string.h>
 
 #include "VLAssert.h"
@@ -62,6 +63,33 @@ VLString VLUtilities::GetBoxArtImagePath(const char* boxartprefix, VL_WS_BoxArtS
 
 VLString VLUtilities::GetBoxArtImageURL(const char* boxartprefix, VL_WS_BoxArtSize size) {
   return "http://" VL_STORE_IMAGE_HOST + GetBoxArtImagePath(boxartprefix, size);
+}
+
+namespace {
+
+// The markers of a JPEG stream: start of image (with the first byte of the next marker) and end
+// of image.
+const unsigned char kJpegHead[] = {0xFF, 0xD8, 0xFF};
+const unsigned char kJpegTail[] = {0xFF, 0xD9};
+
+bool IsJpeg(const void* head, const void* tail) {
+  return memcmp(head, kJpegHead, sizeof kJpegHead) == 0 && memcmp(tail, kJpegTail, sizeof kJpegTail) == 0;
+}
+
+}  // namespace
+
+bool VLUtilities::IsJpegImage(const VLString& bytes) {
+  return bytes.length() >= sizeof kJpegHead + sizeof kJpegTail &&
+         IsJpeg(bytes.c_str(), bytes.c_str() + bytes.length() - sizeof kJpegTail);
+}
+
+bool VLUtilities::IsJpegFile(const VLString& filename) {
+  const vl_int64 headLength = sizeof kJpegHead, tailLength = sizeof kJpegTail;
+  unsigned char head[sizeof kJpegHead], tail[sizeof kJpegTail];
+  VLFile file;
+  return file.Open(filename.c_str(), "rb") && file.GetSize() >= headLength + tailLength &&
+         file.Read(head, headLength) == headLength && file.Seek(-tailLength, SEEK_END) &&
+         file.Read(tail, tailLength) == tailLength && IsJpeg(head, tail);
 }
 
 namespace {

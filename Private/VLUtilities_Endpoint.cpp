@@ -2,10 +2,9 @@
 // type and the environment, asking the store's device-environment service for the "default"
 // environment.
 #include <stdio.h>
-#include <string.h>
 
+#include "VLHttpGet.h"
 #include "VLStoreHosts.h"
-#include "VLTransportConnection.h"
 #include "VLUtilities.h"
 
 namespace {
@@ -25,34 +24,23 @@ const char* BaseURL(int contentType, int env) {
   return "https://" VL_STORE_PRODUCTION_HOST "/api/";
 }
 
-// The environment in the service's answer: the digit after the blank line of an
-// "HTTP/1.1 200 OK" answer with "Content-Length: 1"; production for anything else. A missing or
-// non-digit body byte is such an answer too, so the environment is always a digit.
-int ParseEnvironment(const char* answer) {
-  const char* status = strstr(answer, "HTTP/1.1 200 OK\r\n");
-  const char* length = status ? strstr(status, "Content-Length: 1\r\n") : 0;
-  const char* blank = length ? strstr(length, "\r\n\r\n") : 0;
-  if (!blank || blank[4] < '0' || blank[4] > '9') return kProductionEnv;
-  return blank[4] - '0';
-}
-
-// Asks the device-environment service of the production host for the device's environment.
-// False when no connection could be opened.
+// Asks the device-environment service of the production host for the device's environment: the
+// digit of an "HTTP/1.1 200 OK" answer whose body is that one digit, production for any other
+// answer (none included). False when no connection could be opened.
 bool AskDeviceEnvironment(soap* context, const char* destinationUniqueID, int destinationTypeID, int* env) {
   char type[16];
   snprintf(type, sizeof(type), "%d", destinationTypeID);
   VLString target = "/device/env/?d=" + VLUtilities::URLEncode(destinationUniqueID) + "&dt=" + type;
   VLString url = "https://" VL_STORE_PRODUCTION_HOST + target;
-
-  VLTransportConnection connection(context);
-  if (!connection.Open(url.c_str(), VL_STORE_PRODUCTION_HOST, 443)) return false;
   VLString request = "GET " + target + " HTTP/1.1\r\n";
   request += "User-Agent: DUDUVud\r\nHost: " VL_STORE_PRODUCTION_HOST "\r\n\r\n";
-  char answer[2048];
-  size_t received = 0;
-  if (connection.Send(request.c_str(), request.length())) received = connection.Receive(answer, sizeof(answer) - 1);
-  answer[received] = 0;
-  *env = ParseEnvironment(answer);
+
+  VLHttpGet get(context);
+  VLHttpGet::Result result = get.Run(url.c_str(), VL_STORE_PRODUCTION_HOST, 443, request);
+  if (result == VLHttpGet::HTTP_CONNECT_FAILED) return false;
+  bool digit = result == VLHttpGet::HTTP_OK && get.ContentLength() == 1 && get.ReceiveBody() &&
+               get.Body()[0] >= '0' && get.Body()[0] <= '9';
+  *env = digit ? get.Body()[0] - '0' : kProductionEnv;
   return true;
 }
 

@@ -41,9 +41,9 @@ class BoxArtRequest {
   const VLString& FileName() const { return m_FileName; }
 
   // For a file cache: true when the image's file is there, after revalidating it when its row
-  // asks for that, or after downloading it when it is not.
+  // asks for that, or after downloading it when it is not (or is no image).
   bool LocalFile() {
-    if (ReadRow() && VLFile::Exist(m_FileName.c_str())) {
+    if (ReadRow() && VLUtilities::IsJpegFile(m_FileName)) {
       Revalidate(0);
       return true;
     }
@@ -51,15 +51,15 @@ class BoxArtRequest {
   }
 
   // The image from the cache (revalidated when its row asks for that) into image; false when the
-  // cache has no usable copy.
+  // cache has no usable copy: none, or one that is no image.
   bool AnswerFromCache(VL_WS_Image& image) {
     if (m_CacheType == kNoCache || !ReadRow()) return false;
     if (m_CacheType == kFileCache) {
-      if (!VLFile::Exist(m_FileName.c_str())) return false;
+      if (!VLUtilities::IsJpegFile(m_FileName)) return false;
       Revalidate(0);
       return VLUtilities::SetImageByFile(image, m_FileName);
     }
-    if (m_Data.empty()) return false;
+    if (!VLUtilities::IsJpegImage(m_Data)) return false;
     VLString fresh;
     VLUtilities::SetImageByData(image, Revalidate(&fresh) == VL_WS_OK ? fresh : m_Data);
     return true;

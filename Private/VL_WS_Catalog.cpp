@@ -41,7 +41,8 @@ VL_WS_Status Search(const char* name, const char* cacheName, const Operation& op
                     int currentPageNumber, int itemsPerPage, int purchaseType, int titleType, const char* query,
                     VL_WS_TitlesResponse* titles) {
   VL_WS_Client* client = VLClientFor(handle, titles);
-  if (client == 0 || query == 0 || *query == 0) return VL_WS_E_INVALID_ARGUMENT;
+  if (client == 0 || query == 0 || *query == 0 || !VLPageFits(currentPageNumber, itemsPerPage))
+    return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, cacheName,
                         VLCacheKey("%d,%d,%d,%d,%s", currentPageNumber, itemsPerPage, purchaseType, titleType, query)};
   int soapError = VLCachedCall(
@@ -87,7 +88,7 @@ extern "C" VL_WS_Status VL_WS_getGenreLabel(VL_WS_Handle* handle, int genreID, V
 extern "C" VL_WS_Status VL_WS_getTitles(VL_WS_Handle* handle, int genreID, int currentPageNumber, int itemsPerPage,
                                         int purchaseType, VL_WS_TitlesResponse* titles) {
   VL_WS_Client* client = VLClientFor(handle, titles);
-  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  if (client == 0 || !VLPageFits(currentPageNumber, itemsPerPage)) return VL_WS_E_INVALID_ARGUMENT;
   VLCacheEntry entry = {VLCacheKind::kMetaData, "getTitles",
                         VLCacheKey("%d,%d,%d,%d", genreID, currentPageNumber, itemsPerPage, purchaseType)};
   int soapError = VLCachedCall(
@@ -106,7 +107,8 @@ extern "C" VL_WS_Status VL_WS_getTitlesByGenreIDs(VL_WS_Handle* handle, int coun
                                                   int currentPageNumber, int itemsPerPage, int purchaseType,
                                                   VL_WS_TitlesResponseArray* pages) {
   VL_WS_Client* client = VLClientFor(handle, pages);
-  if (client == 0 || count < 1 || genreIDs == 0) return VL_WS_E_INVALID_ARGUMENT;
+  if (client == 0 || count < 1 || genreIDs == 0 || !VLPageFits(currentPageNumber, itemsPerPage))
+    return VL_WS_E_INVALID_ARGUMENT;
   soap& context = client->m_RealTimeBrowse;
   int soapError = VLServiceCall(
       *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getTitlesByGenreArray),

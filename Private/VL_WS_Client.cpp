@@ -2,6 +2,7 @@
 // the environment queries and VL_WS_getVersion.
 #include "VL_WS_Client.h"
 
+#include <limits.h>
 #include <stdio.h>
 #include <string.h>
 
@@ -37,8 +38,10 @@ bool ValidSetup(const VL_WS_SetupParams& in) {
   return in.EnvNum >= 0;
 }
 
-// Gives the handle its tag cell and a new client state, three service objects included.
+// Gives the handle its tag cell and a new client state, three service objects included. Null for
+// a handle that is not empty: making it anew would lose (and leak) what it holds.
 VL_WS_Client* NewClient(VL_WS_Handle* handle) {
+  if (handle->tag != 0 || handle->client != 0) return 0;
   VLRecordInit(*handle);
   handle->client = new VL_WS_Client;
   return handle->client;
@@ -110,13 +113,14 @@ VL_WS_AccessType ResolveAccessType(VL_WS_Handle* handle, VL_WS_AccessType given)
 }
 
 // A new open cache, or null. With deleteDamaged, a cache file that cannot be opened (a damaged
-// database, or not one at all) is deleted and the open tried once more.
+// database, not one at all, or a file this process may not open) is deleted and the open tried
+// once more.
 CacheInterface* OpenCache(const VL_WS_CacheParam2& params, bool deleteDamaged) {
   CacheInterface* cache = new CacheMgr;
   if (cache->Open(params) == 0) return cache;
-  if (deleteDamaged && params.CacheType == kFileCache && VLFile::Exist(params.CachePath.c_str())) {
-    VLFile::Remove(params.CachePath.c_str());
-    if (cache->Open(params) == 0) return cache;
+  if (deleteDamaged && params.CacheType == kFileCache && CacheMgr::RemoveDatabaseFile(params.CachePath) &&
+      cache->Open(params) == 0) {
+    return cache;
   }
   delete cache;
   return 0;
@@ -125,6 +129,12 @@ CacheInterface* OpenCache(const VL_WS_CacheParam2& params, bool deleteDamaged) {
 }  // namespace
 
 VL_WS_Client* VLClientOf(const VL_WS_Handle* handle) { return handle != 0 ? handle->client : 0; }
+
+bool VLPageFits(int currentPageNumber, int itemsPerPage) {
+  for (int value : {currentPageNumber, itemsPerPage})
+    if (value < SHRT_MIN || value > SHRT_MAX) return false;
+  return true;
+}
 
 void VLEndCall(soap& context) {
   soap_destroy(&context);
@@ -143,6 +153,7 @@ void VLClientRelease(VL_WS_Client* client) {
 extern "C" VL_WS_Status VL_WS_initialize(VL_WS_Handle* handle, const VL_WS_SetupParams* params) {
   if (handle == 0) return VL_WS_E_INVALID_ARGUMENT;
   VL_WS_Client* client = NewClient(handle);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;  // the live handle stays as it is
   if (params == 0 || !ValidSetup(*params)) return Fail(handle, VL_WS_E_INVALID_ARGUMENT);
   const VL_WS_SetupParams& in = *params;
   if (in.CacheType == kFileCache && *in.CachePath && !VLFile::CreateFolder(in.CachePath))
@@ -197,6 +208,7 @@ extern "C" VL_WS_Status VL_WS_initialize(VL_WS_Handle* handle, const VL_WS_Setup
 extern "C" VL_WS_Status VL_WS_duplicate(VL_WS_Handle* copy, const VL_WS_Handle* source) {
   if (copy == 0 || copy == source) return VL_WS_E_INVALID_ARGUMENT;
   VL_WS_Client* client = NewClient(copy);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;  // the live copy stays as it is
   const VL_WS_Client* from = VLClientOf(source);
   if (from == 0) return VL_WS_E_INVALID_ARGUMENT;
   if (!SetupTLS(client)) return VL_WS_E_TLS_SETUP;

@@ -38,6 +38,11 @@ VL_WS_Client* VLClientFor(const VL_WS_Handle* handle, Record* record) {
   return VLClientOf(handle);
 }
 
+// Whether a page request can be answered: the store's answer carries page number and size in
+// 16-bit fields, so a value beyond them would come back wrapped (100000 as -31072). The paged
+// operations refuse any other with -1000.
+bool VLPageFits(int currentPageNumber, int itemsPerPage);
+
 // Ends one SOAP call on a service context: deletes the call's request and response records and
 // everything else the call allocated in the context (the reply's header and texts included) and
 // ends the context's message state. Nothing of the reply may be used afterwards. Every

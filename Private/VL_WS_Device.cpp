@@ -195,7 +195,7 @@ VL_WS_Status AskServerTime(soap* context, time_t* serverTime) {
     default:
       return VL_WS_E_NETWORK;
   }
-  if (get.BodyReceived() < get.ContentLength() || !ParseServerTime(get.Body(), serverTime)) return VL_WS_E_UNEXPECTED;
+  if (!get.ReceiveBody() || !ParseServerTime(get.Body(), serverTime)) return VL_WS_E_UNEXPECTED;
   return VL_WS_OK;
 }
 

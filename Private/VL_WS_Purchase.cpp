@@ -85,7 +85,7 @@ extern "C" VL_WS_Status VL_WS_getMyVideos(VL_WS_Handle* handle, int currentPageN
                                           int purchaseType, int titleType, int watchStatusFilter,
                                           VL_WS_MyVideosResponse* videos) {
   VL_WS_Client* client = VLClientFor(handle, videos);
-  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  if (client == 0 || !VLPageFits(currentPageNumber, itemsPerPage)) return VL_WS_E_INVALID_ARGUMENT;
   auto fill = [=](auto& request) {
     request.CurrentPageNumber = currentPageNumber;
     request.ItemsPerPage = itemsPerPage;

@@ -24,6 +24,8 @@ VL_WS_Status SettingStatus(CfgXMLFile::Result result) {
       return VL_WS_E_SETTING_MISSING;
     case CfgXMLFile::CFG_DAMAGED:
       return VL_WS_E_SETTING_DAMAGED;
+    case CfgXMLFile::CFG_UNREADABLE:
+      return VL_WS_E_SETTING_UNREADABLE;
   }
   return VL_WS_E_UNEXPECTED;
 }

@@ -32,8 +32,10 @@ struct VL_WS_SetupParams2 {
   int ProxyPort = 0;
   VLString ProxyUserName;
   VLString ProxyPassword;
-  int SendTimeout = 30;  // seconds, for sending and for connecting (TLS handshake included)
-  int RecvTimeout = 88;  // seconds, for receiving
+  // Seconds. Each bounds one wait; together they bound a whole exchange, from connecting to the
+  // last byte of the answer (VLSoapTransport).
+  int SendTimeout = 30;  // for sending and for connecting (TLS handshake included)
+  int RecvTimeout = 88;  // for receiving
   bool AuthTokenValid = false;  // the last answer of the store's token check
   VL_WS_AccessType AccessType = UNKNOWN;
   VLString ApplicationRevision;

@@ -55,7 +55,7 @@ int Mark(int titleID, const int* ids, int count, bool* flags) {
 extern "C" VL_WS_Status VL_WS_getWishlistItems(VL_WS_Handle* handle, VL_WS_SortOrder sortOrder, int currentPageNumber,
                                                int itemsPerPage, int titleType, VL_WS_WishlistItemsResponse* items) {
   VL_WS_Client* client = VLClientFor(handle, items);
-  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  if (client == 0 || !VLPageFits(currentPageNumber, itemsPerPage)) return VL_WS_E_INVALID_ARGUMENT;
   const int order = VLUtilities::SortOrder2Int(sortOrder);
   VLCacheEntry entry = {VLCacheKind::kUserData, kWishlistPages,
                         VLCacheKey("%d,%d,%d,%d", order, currentPageNumber, itemsPerPage, titleType)};

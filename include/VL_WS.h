@@ -30,11 +30,13 @@ extern "C" {
  * UNKNOWN asks the store through VL_WS_getFileType; a failed question leaves UNKNOWN) and, for
  * CacheType 1 or 2, an open cache refreshed with VL_WS_updateLocalCache(handle, 5). The cache
  * file of CacheType 2 is "<CachePath>/<hashes of device, key, account and cache settings>.vl"
- * (CachePath "" is the current folder); a file that is no usable database is deleted and made
- * anew.
+ * (CachePath "" is the current folder); a file that cannot be opened as a database is deleted
+ * and made anew, and so is a database that SQLite finds damaged later, by the operation that
+ * finds it (which misses).
  *
  * Returns VL_WS_OK, or:
- *   VL_WS_E_INVALID_ARGUMENT  a null argument; APIKey, DestinationUniqueID, UserName or Password
+ *   VL_WS_E_INVALID_ARGUMENT  a null argument; a handle that is not empty (it is left as it
+ *                             is); APIKey, DestinationUniqueID, UserName or Password
  *                             missing or empty; DestinationUniqueID longer than 350 bytes;
  *                             CachePath null with CacheType 2; CacheLimit neither 0 nor at
  *                             least 358400 with a cache; ContentType not 0 or 1; CacheType not
@@ -55,9 +57,10 @@ VL_WS_Status VL_WS_initialize(VL_WS_Handle* handle, const VL_WS_SetupParams* par
  * Nothing is asked of the store again: endpoint, environment, User-Agent, access type and token
  * are the source's. Source and copy share nothing in memory and may be released in any order.
  *
- * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (null `copy`, `copy` equal to `source`, or a
- * source without client state), VL_WS_E_TLS_SETUP or VL_WS_E_CACHE_OPEN. On a failure the copy
- * may hold a partial handle: release it.
+ * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (null `copy`, `copy` equal to `source`, a `copy`
+ * that is not empty, which is left as it is, or a source without client state),
+ * VL_WS_E_TLS_SETUP or VL_WS_E_CACHE_OPEN. On a failure the copy may hold a partial handle:
+ * release it.
  */
 VL_WS_Status VL_WS_duplicate(VL_WS_Handle* copy, const VL_WS_Handle* source);
 
@@ -121,7 +124,8 @@ VL_WS_Status VL_WS_getFileType(VL_WS_Handle* handle, VL_WS_FileType* fileType);
  * made with access type DOWNLOAD and to the streaming service otherwise. It prepares its result
  * before anything else: a record is cleared and tagged (release it whatever the status), a bool
  * or int result is set to false or 0. It returns VL_WS_E_INVALID_ARGUMENT for a handle without
- * client state, a null result pointer, or a required argument that is missing or empty, before
+ * client state, a null result pointer, a required argument that is missing or empty, or a page
+ * number or page size outside -32768 to 32767 (the store answers them in 16-bit fields), before
  * any request.
  *
  * A failed call (no connection, TLS, HTTP or SOAP failure) returns its status (VL_WS_E_CONNECT,
@@ -432,8 +436,9 @@ VL_WS_Status VL_WS_getAudioDefaultProperty(VL_WS_Handle* handle, int* audioProfi
  * non-zero ResponseCode of the store (the record still holds it); the others return VL_WS_OK and
  * leave the code in the record for the caller.
  *
- * Besides the failures named, every operation returns VL_WS_E_INVALID_ARGUMENT for a null record
- * or a handle without client state, and the status of a failed SOAP call (VL_WS_E_CONNECT,
+ * Besides the failures named, every operation returns VL_WS_E_INVALID_ARGUMENT for a null record,
+ * a handle without client state or a page number or page size outside -32768 to 32767 (the
+ * store answers them in 16-bit fields), and the status of a failed SOAP call (VL_WS_E_CONNECT,
  * VL_WS_E_TLS, VL_WS_E_HTTP_STATUS(n), VL_WS_E_SOAP_FAULT(n), ...), after which the record holds
  * nothing but its tags.
  * ------------------------------------------------------------------------------------------- */
@@ -720,6 +725,7 @@ VL_WS_Status VL_WS_getServerTime(time_t* serverTime);
  *   VL_WS_E_FILE              the file cannot be opened or read
  *   VL_WS_E_SETTING_MISSING   the file is empty, holds no settings, or none with the key
  *   VL_WS_E_SETTING_DAMAGED   the encrypted value is damaged (also: an encrypted empty value)
+ *   VL_WS_E_SETTING_UNREADABLE  the file does not parse as a settings file (cut short, garbage)
  * On failure the record is tagged and holds no text.
  */
 VL_WS_Status VL_WS_readSetting(const char* filename, const char* key, VL_WS_String* value,
@@ -732,10 +738,14 @@ VL_WS_Status VL_WS_readSetting(const char* filename, const char* key, VL_WS_Stri
  * The first setting with the key is replaced in place, or a new one is appended; every other
  * setting keeps its place and text. A missing file, and the folder of `filename` when it is
  * missing, are created. The file is replaced whole, so a crash leaves the old or the new file.
- * An empty value written encrypted reads back as VL_WS_E_SETTING_DAMAGED.
+ * A file that does not parse (VL_WS_E_SETTING_UNREADABLE for a read) is kept as
+ * "<filename>.damaged", replacing an older one, before a new file with this one setting takes
+ * its place. A file written with an encrypted value is readable by its owner only. An empty
+ * value written encrypted reads back as VL_WS_E_SETTING_DAMAGED.
  *
  * Returns VL_WS_OK, VL_WS_E_INVALID_ARGUMENT (null or empty `filename` or `key`, null `value`)
- * or VL_WS_E_FILE (the folder or the file cannot be created or written).
+ * or VL_WS_E_FILE (the folder or the file cannot be created or written, the file exists but
+ * cannot be read, or a file that does not parse cannot be kept aside).
  */
 VL_WS_Status VL_WS_writeSetting(const char* filename, const char* key, const char* value,
                                 bool encrypted);

@@ -99,6 +99,8 @@ enum VL_WS_StatusCode {
   VL_WS_E_SETTING_MISSING = -1906,
   /* Configuration file: an encrypted value is damaged. */
   VL_WS_E_SETTING_DAMAGED = -1907,
+  /* Configuration file: the file cannot be read as a settings file (cut short, garbage). */
+  VL_WS_E_SETTING_UNREADABLE = -1908,
   /* The cache database could not be opened. */
   VL_WS_E_CACHE_OPEN = -1910,
   /* The cache folder does not exist and cannot be created. */

@@ -19,12 +19,15 @@ std::string Ok(const std::string& body, const std::string& headers = "") {
   return VLTestServer::HttpReply(body, "200 OK", headers);
 }
 
-// Bytes of every value, zeros included, as an image has them.
+// Bytes of every value, zeros included, as an image has them, between the markers that begin
+// and end a JPEG image (size at least 5).
 std::string Image(size_t size) {
   std::string data(size, '\0');
   for (size_t i = 0; i < size; ++i) data[i] = static_cast<char>(i * 7 % 256);
-  return data;
+  return data.replace(0, 3, "\xFF\xD8\xFF").replace(size - 2, 2, "\xFF\xD9");
 }
+
+const std::string kTiny = Image(8);
 
 const char kLastModified[] = "Mon, 03 Jan 2011 10:00:00 GMT";
 
@@ -52,7 +55,7 @@ class BoxArtDownloaderTest : public testing::Test {
 
 TEST_F(BoxArtDownloaderTest, SendsAHandBuiltGetConditionalWhenAsked) {
   VLString data;
-  m_Host.SetReply(Ok("x"));
+  m_Host.SetReply(Ok(kTiny));
   ASSERT_EQ(VL_WS_OK, m_Downloader.DownloadToBuffer("night owl_", VL_WS_BOXART_135S, "", data));
   EXPECT_EQ(
       "GET /images/boxart/135s/night%20owl_135.jpg HTTP/1.1\r\n"
@@ -74,8 +77,8 @@ TEST_F(BoxArtDownloaderTest, ReadsTheImageAndItsValidators) {
   EXPECT_EQ(kLastModified, m_Downloader.GetLastModified());
 
   // Each download starts afresh: no "Last-Modified" gives none, a failure gives 0.
-  ASSERT_EQ(VL_WS_OK, Get(Ok("abc"), &data));
-  EXPECT_EQ("abc", data);
+  ASSERT_EQ(VL_WS_OK, Get(Ok(kTiny), &data));
+  EXPECT_EQ(kTiny, data);
   EXPECT_TRUE(m_Downloader.GetLastModified().empty());
   EXPECT_EQ(VL_WS_E_NETWORK, Get(""));
   EXPECT_EQ(0u, m_Downloader.GetContentLength());
@@ -106,8 +109,8 @@ TEST_F(BoxArtDownloaderTest, AnswersOtherThanACompleteImageFail) {
 
 TEST_F(BoxArtDownloaderTest, BodyBeyondTheAnnouncedLengthIsNotTaken) {
   std::string data;
-  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 5\r\n\r\nABCDEFGHIJ", &data));
-  EXPECT_EQ("ABCDE", data);
+  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 5\r\n\r\n" + Image(5) + "FGHIJ", &data));
+  EXPECT_EQ(Image(5), data);
   EXPECT_EQ(5u, m_Downloader.GetContentLength());
 }
 
@@ -143,14 +146,14 @@ TEST_F(BoxArtDownloaderTest, FileThatCannotBeWrittenEndsWithAFileError) {
   VLTestDir dir;
   // No temporary file in a missing folder: nothing is asked of the host.
   size_t asked = m_Host.Requests().size();
-  EXPECT_EQ(VL_WS_E_FILE, GetFile(Ok("abc"), dir / "missing/t1001_175.jpg"));
+  EXPECT_EQ(VL_WS_E_FILE, GetFile(Ok(kTiny), dir / "missing/t1001_175.jpg"));
   EXPECT_EQ(asked, m_Host.Requests().size());
 
   // A folder with content in the destination's place cannot be replaced.
   std::string blocked = dir / "t1001_175.jpg";
   ASSERT_EQ(0, mkdir(blocked.c_str(), 0755));
   ASSERT_TRUE(VLWriteFile(blocked + "/keep", "x"));
-  EXPECT_EQ(VL_WS_E_FILE, GetFile(Ok("abc"), blocked));
+  EXPECT_EQ(VL_WS_E_FILE, GetFile(Ok(kTiny), blocked));
   EXPECT_EQ(std::set<std::string>{"t1001_175.jpg"}, VLFolderFiles(dir.path()));
 }
 
@@ -160,8 +163,8 @@ TEST_F(BoxArtDownloaderTest, UnreachableHostEndsWithAConnectionError) {
   m_Context.proxy_host = "127.0.0.1";
   m_Context.proxy_port = VLClosedPort();
   std::string data;
-  EXPECT_EQ(VL_WS_E_CONNECT, Get(Ok("abc"), &data));
-  EXPECT_EQ(VL_WS_E_CONNECT, GetFile(Ok("abc"), dir / "t1001_175.jpg"));
+  EXPECT_EQ(VL_WS_E_CONNECT, Get(Ok(kTiny), &data));
+  EXPECT_EQ(VL_WS_E_CONNECT, GetFile(Ok(kTiny), dir / "t1001_175.jpg"));
   EXPECT_TRUE(VLFolderFiles(dir.path()).empty());
   m_Context.proxy_host = nullptr;
 }

@@ -80,12 +80,20 @@ void ExpectOnlyKinds(CacheMgr& cache, int data) {
   }
 }
 
-// Runs one statement on a cache file from outside, as another program would.
-void RunOnFile(const std::string& path, const std::string& sql) {
+// Runs statements on a cache file from outside, as another program would; the first column of
+// the first row they give, as text.
+std::string RunOnFile(const std::string& path, const std::string& sql) {
   sqlite3* db = nullptr;
-  ASSERT_EQ(SQLITE_OK, sqlite3_open(path.c_str(), &db));
-  EXPECT_EQ(SQLITE_OK, sqlite3_exec(db, sql.c_str(), nullptr, nullptr, nullptr)) << sql;
+  std::string first;
+  EXPECT_EQ(SQLITE_OK, sqlite3_open(path.c_str(), &db));
+  auto keepFirst = [](void* out, int, char** values, char**) {
+    std::string& text = *static_cast<std::string*>(out);
+    if (text.empty() && values[0]) text = values[0];
+    return 0;
+  };
+  EXPECT_EQ(SQLITE_OK, sqlite3_exec(db, sql.c_str(), keepFirst, &first, nullptr)) << sql;
   sqlite3_close(db);
+  return first;
 }
 
 // Box art gets 70%, the others 15% each; the rounding rest goes to box art, else to user data,
@@ -345,17 +353,24 @@ TEST(CacheTypes, MemoryCachesAreSeparateAndLostAtClose) {
   EXPECT_FALSE(HasMeta(a, "n", "k"));
 }
 
-TEST(CacheTypes, FileCacheIsSharedAndHoldsNoConnectionBetweenOperations) {
+// Two caches of every kind without a budget, open on one new file.
+struct TwoCachesOnOneFile {
+  TwoCachesOnOneFile() {
+    EXPECT_EQ(0, a.Open(Params(kFile, kAllData, 0, path)));
+    EXPECT_EQ(0, b.Open(Params(kFile, kAllData, 0, path)));
+  }
   VLTestDir dir;
   std::string path = dir / "c.vl";
   CacheMgr a, b;
-  ASSERT_EQ(0, a.Open(Params(kFile, kAllData, 0, path)));
-  ASSERT_EQ(0, b.Open(Params(kFile, kAllData, 0, path)));
-  ASSERT_TRUE(a.WriteMetaData("n", "k", "v"));
-  EXPECT_TRUE(HasMeta(b, "n", "k"));
+};
+
+TEST(CacheTypes, FileCacheIsSharedAndHoldsNoConnectionBetweenOperations) {
+  TwoCachesOnOneFile file;
+  ASSERT_TRUE(file.a.WriteMetaData("n", "k", "v"));
+  EXPECT_TRUE(HasMeta(file.b, "n", "k"));
   // Another program can take the write lock while both caches are open.
-  RunOnFile(path, "BEGIN EXCLUSIVE; DELETE FROM Service; COMMIT;");
-  EXPECT_FALSE(HasMeta(a, "n", "k"));
+  RunOnFile(file.path, "BEGIN EXCLUSIVE; DELETE FROM Service; COMMIT;");
+  EXPECT_FALSE(HasMeta(file.a, "n", "k"));
 }
 
 TEST(CacheTypes, FileThatCannotBeOpenedFailsOpen) {
@@ -368,6 +383,29 @@ TEST(CacheTypes, FileThatCannotBeOpenedFailsOpen) {
   ASSERT_TRUE(VLWriteFile(dir / "junk.vl", std::string(4096, 'j')));
   EXPECT_NE(0, cache.Open(Params(kFile, kAllData, 0, dir / "junk.vl")));
   EXPECT_FALSE(cache.WriteMetaData("n", "k", "v"));
+}
+
+// Bytes overwritten in a data page (the file's header intact): the operation that meets the
+// damage misses and leaves a new, empty database that every object on the file uses.
+TEST(CacheTypes, DamagedDatabaseIsMadeAnewByTheOperationThatFindsIt) {
+  TwoCachesOnOneFile file;
+  CacheMgr &cache = file.a, &other = file.b;
+  const std::string& path = file.path;
+  const std::string value(500, 'v');
+  for (int i = 0; i < 30; ++i) ASSERT_TRUE(cache.WriteMetaData("n", std::to_string(i).c_str(), value.c_str()));
+  long pageSize = std::stol(RunOnFile(path, "PRAGMA page_size"));
+  long root = std::stol(RunOnFile(path, "SELECT rootpage FROM sqlite_master WHERE name = 'Service'"));
+  std::string bytes = VLReadFile(path);
+  ASSERT_GT(root, 1);
+  bytes.replace((root - 1) * pageSize, pageSize, pageSize, '\xA5');
+  ASSERT_TRUE(VLWriteFile(path, bytes));
+
+  EXPECT_FALSE(HasMeta(cache, "n", "7"));
+  EXPECT_EQ("ok", RunOnFile(path, "PRAGMA integrity_check"));
+  EXPECT_FALSE(HasMeta(other, "n", "8"));
+  ASSERT_TRUE(other.WriteMetaData("n", "k", "v"));
+  EXPECT_TRUE(HasMeta(cache, "n", "k"));
+  EXPECT_FALSE(VLFile::Exist((path + "-journal").c_str()));
 }
 
 TEST(CacheTypesDeathTest, ExecuteSQLNeedsAConnection) {

@@ -16,6 +16,7 @@
 
 #include "CfgXMLFile.h"
 #include "EVPCipher.h"
+#include "VLFile.h"
 #include "VLTestDir.h"
 
 namespace {
@@ -83,8 +84,6 @@ TEST(CfgXMLFile, FilesThatHoldNoSetting) {
   EXPECT_READ(dir.path(), "A", false, CFG_FILE_ERROR, "");  // a folder
   ASSERT_TRUE(VLWriteFile(dir / "empty.xml", ""));
   EXPECT_READ(dir / "empty.xml", "A", false, CFG_NOT_FOUND, "");
-  ASSERT_TRUE(VLWriteFile(dir / "garbage.xml", "\x1F\x8B not a settings file"));
-  EXPECT_READ(dir / "garbage.xml", "A", false, CFG_NOT_FOUND, "");
   ASSERT_TRUE(VLWriteFile(dir / "none.xml", "<DUDUVud/>"));
   EXPECT_READ(dir / "none.xml", "A", false, CFG_NOT_FOUND, "");
 
@@ -105,13 +104,55 @@ TEST(CfgXMLFile, FilesThatHoldNoSetting) {
   EXPECT_NE(std::string::npos, text.find("two"));
   EXPECT_READ(dir / "hand.xml", "K", false, CFG_OK, "three");
 
-  // Writing counts a missing, empty or unparsable file as one without settings.
-  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(dir / "garbage.xml", "A", "1"));
-  EXPECT_READ(dir / "garbage.xml", "A", false, CFG_OK, "1");
+  // Writing counts a missing or empty file as one without settings.
   ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(dir / "empty.xml", "A", "2"));
   EXPECT_READ(dir / "empty.xml", "A", false, CFG_OK, "2");
   EXPECT_EQ(CfgXMLFile::CFG_FILE_ERROR, WriteSetting(dir / "no/such/folder.xml", "A", "3"));
   EXPECT_EQ(CfgXMLFile::CFG_FILE_ERROR, WriteSetting(dir.path(), "A", "4"));
+}
+
+// A file that does not parse may hold the account's token: it reads as unreadable, not as
+// missing a key, and a write keeps its bytes as NAME.damaged before the new file replaces it.
+TEST(CfgXMLFile, AFileThatDoesNotParseIsKeptAside) {
+  VLTestDir dir;
+  std::string whole = dir / "whole.xml";
+  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(whole, "AuthToken", "token-4711", true));
+  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(whole, "DestinationUniqueID", "00-11-22-33-44-55"));
+  std::string text = VLReadFile(whole);
+  std::string tooMany = "<DUDUVud xmlns:VL1=\"http://store.ostrel.example/api/\">";
+  for (int i = 0; i < 200000; ++i) tooMany += "<VL1:Configuration Key=\"K\"/>";
+  tooMany += "</DUDUVud>";
+  const std::string damaged[] = {text.substr(0, text.size() / 2), "\x1F\x8B not a settings file",
+                                 "<other>" + text + "</other>", tooMany};
+  for (const std::string& bytes : damaged) {
+    SCOPED_TRACE(bytes.substr(0, 40));
+    std::string path = dir / "settings.xml";
+    ASSERT_TRUE(VLWriteFile(path, bytes));
+    ASSERT_EQ(0, chmod(path.c_str(), 0640));
+    EXPECT_READ(path, "DestinationUniqueID", false, CFG_UNREADABLE, "");
+    ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(path, "Volume", "7"));
+    EXPECT_READ(path, "Volume", false, CFG_OK, "7");
+    EXPECT_READ(path, "DestinationUniqueID", false, CFG_NOT_FOUND, "");
+    EXPECT_EQ(bytes, VLReadFile(path + ".damaged"));
+    struct stat st;
+    ASSERT_EQ(0, stat((path + ".damaged").c_str(), &st));
+    EXPECT_EQ(0640u, st.st_mode & 07777);
+  }
+  // A file that exists but cannot be read is left alone.
+  ASSERT_EQ(0, mkdir((dir / "folder.xml").c_str(), 0755));
+  EXPECT_EQ(CfgXMLFile::CFG_FILE_ERROR, WriteSetting(dir / "folder.xml", "A", "1"));
+  EXPECT_FALSE(VLFile::Exist((dir / "folder.xml.damaged").c_str()));
+
+  // A file that holds an encrypted value is its owner's alone.
+  std::string open = dir / "open.xml";
+  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(open, "Volume", "7"));
+  ASSERT_EQ(0, chmod(open.c_str(), 0644));
+  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(open, "AuthToken", "token-4711", true));
+  struct stat st;
+  ASSERT_EQ(0, stat(open.c_str(), &st));
+  EXPECT_EQ(0600u, st.st_mode & 07777);
+  ASSERT_EQ(0, stat(whole.c_str(), &st));
+  EXPECT_EQ(0600u, st.st_mode & 07777);
 }
 
 TEST(CfgXMLFile, TextIsKeptAsUtf8Bytes) {

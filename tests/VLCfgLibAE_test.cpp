@@ -216,6 +216,17 @@ TEST_F(CfgUpgrade, AFailedRebuildLeavesTheOldFile) {
   EXPECT_EQ("token-4711", Setting(Path("ffpreference.xml"), "AuthToken", true));
 }
 
+TEST_F(CfgUpgrade, ASettingsFileThatCannotBeReadIsNotRebuilt) {
+  InitWith("1.2", "1.3");
+  std::string file = Path("ffpreference.xml");
+  std::string cut = VLReadFile(file).substr(0, 200);
+  ASSERT_TRUE(VLWriteFile(file, cut));
+  ASSERT_EQ("true", Eval("cfg.init('VLTEST_CFG', 'VLTEST_PREF')"));
+  EXPECT_EQ(cut, VLReadFile(file));
+  EXPECT_TRUE(Logged("1:VLCfgLibAE::checkXMLupgrade Error: SettingsFile(./ffpreference.xml) cannot be read; it is not "
+                     "upgraded."));
+}
+
 // ---- Environments ----
 
 TEST_F(CfgMovie, SelectEnvSwitchesAmongTheEnvironmentFiles) {

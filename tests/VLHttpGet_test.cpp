@@ -91,13 +91,34 @@ TEST_F(HttpGet, OtherAnswersAreNamed) {
       {"HTTP/1.1 200 OK\r\nContent-Length: 99999999999999999999\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
       {"HTTP/1.1 200 OK\r\nX-Body: Content-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
       {"HTTP/1.1 200 OK\r\nContent-Length: 1\r\n", VLHttpGet::HTTP_BAD_ANSWER},
-      // The whole header must come in the first piece.
+      // The whole header must fit into the first piece.
       {"HTTP/1.1 200 OK\r\nX-Long: " + std::string(3000, 'a') + "\r\nContent-Length: 1\r\n\r\nx",
        VLHttpGet::HTTP_BAD_ANSWER},
       {std::string(kNulInHeader, sizeof kNulInHeader - 1), VLHttpGet::HTTP_OK},
       {"", VLHttpGet::HTTP_NOTHING_RECEIVED},
   };
   for (const auto& c : cases) EXPECT_EQ(c.result, Get(c.reply)) << c.reply;
+}
+
+// TCP may deliver an answer in pieces anywhere, also within the header: it is read to the end
+// of the header, and a small body to its announced length.
+TEST_F(HttpGet, AnswersThatArriveInPiecesAreReadWhole) {
+  m_Server.SetBehaviour(VLTestServer::kPieces);
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nLast-Modified: Mon, 03 Jan 2011 10:00:00 GMT\r\n"
+                                    "Content-Length: 25\r\n\r\n12/31/2010 11:59:59 PM ok"));
+  VLString value;
+  EXPECT_TRUE(m_Get.Field("Last-Modified", &value));
+  EXPECT_STREQ("Mon, 03 Jan 2011 10:00:00 GMT", value.c_str());
+  ASSERT_TRUE(m_Get.ReceiveBody());
+  EXPECT_EQ(25u, m_Get.BodyReceived());
+  EXPECT_STREQ("12/31/2010 11:59:59 PM ok", m_Get.Body());
+  EXPECT_EQ(VLHttpGet::HTTP_NOT_FOUND, Get("HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n"));
+
+  // A body that ends early, or does not fit beside the header, is not read whole.
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 30\r\n\r\nshort"));
+  EXPECT_FALSE(m_Get.ReceiveBody());
+  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 3000\r\n\r\nlong"));
+  EXPECT_FALSE(m_Get.ReceiveBody());
 }
 
 TEST_F(HttpGet, ConnectionFailures) {

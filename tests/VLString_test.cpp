@@ -44,15 +44,18 @@ TEST(VLString, AllocationFollowsMultiplesOfEight) {
   EXPECT_EQ(Bytes(wide), Bytes(copy));
 }
 
-TEST(VLString, AppendReallocatesToTheExactFit) {
+TEST(VLString, AppendGrowsByHalfOrToTheExactFit) {
   VLString s("abcde");
   EXPECT_EQ(7u, s.capacity());
   s.append("fg", 2);
   EXPECT_EQ(7u, s.capacity());
   s.append("h", 1);
   EXPECT_EQ(15u, s.capacity());
-  s.append("ijklmnopq", 9);  // 17 -> 24 bytes, no growth factor
+  s.append("ijklmnopq", 9);  // 15 + 7 = 22 -> 24 bytes
   EXPECT_EQ(23u, s.capacity());
+  s.append(std::string(40, 'r').c_str(), 40);  // 57 is more than half as much again: exactly 64 bytes
+  EXPECT_EQ(63u, s.capacity());
+  s.assign("abcdefghijklmnopq", 17);
   EXPECT_EQ("abcdefghijklmnopq", Bytes(s));
   const char* before = s.c_str();
   s.append(nullptr, 0);
@@ -63,6 +66,21 @@ TEST(VLString, AppendReallocatesToTheExactFit) {
   s += "?";
   s += VLString("x\0y", 3);
   EXPECT_EQ(std::string("abcdefghijklmnopq!?x\0y", 22), Bytes(s));
+}
+
+// A text built a character at a time is copied a logarithmic number of times, not once every
+// eight characters.
+TEST(VLString, GrowingACharacterAtATimeCopiesRarely) {
+  VLString s;
+  int copies = 0;
+  for (int i = 0; i < 65536; ++i) {
+    const char* before = s.c_str();
+    s += static_cast<char>('a' + i % 26);
+    copies += s.c_str() != before;
+  }
+  EXPECT_EQ(65536u, s.length());
+  EXPECT_EQ('z', s[25 + 26 * 100]);
+  EXPECT_LT(copies, 40);
 }
 
 TEST(VLString, SourcesInsideTheStringItself) {

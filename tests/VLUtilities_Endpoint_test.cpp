@@ -82,6 +82,11 @@ TEST_F(EndpointQuery, OnlyAnOkAnswerOfOneDigitChoosesTheEnvironment) {
   // Another digit is kept and served by production.
   EXPECT_EQ("https://store.ostrel.example/api/", Ask(Answer("5"), &env));
   EXPECT_EQ(5, env);
+  // An answer that TCP delivers in pieces.
+  m_Service.SetBehaviour(VLTestServer::kPieces);
+  EXPECT_EQ("https://stg.ostrel.example/api/", Ask(Answer("1"), &env));
+  EXPECT_EQ(1, env);
+  m_Service.SetBehaviour(VLTestServer::kReply);
 
   const char* production[] = {
       "HTTP/1.1 200 OK\r\nContent-Length: 1\r\n\r\n",   // the digit is missing

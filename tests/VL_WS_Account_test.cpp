@@ -5,10 +5,13 @@
 #include <gtest/gtest.h>
 
 #include <functional>
+#include <map>
 #include <string>
 #include <vector>
 
 #include "VLTestAccountClient.h"
+#include "VLWSAELog.h"
+#include "VL_Log.h"
 
 namespace {
 
@@ -64,6 +67,37 @@ TEST_F(Account, AuthorisationReplacesTheTokenAndPurgesUserData) {
   EXPECT_EQ("GetCountryID", requests[1].operation);
   EXPECT_EQ(answer->AuthToken, requests[1].authToken);
   EXPECT_EQ((Lines{"VL_WS_authorizeDevice, ret:0,responseCode:0", "VL_WS_getCountryID, ret:0,countryid:1"}), TakeLog());
+}
+
+// The raw logs of the SOAP messages hold every byte but the values of the account's token and
+// password.
+TEST_F(Account, RawLogsMaskTheTokenAndThePassword) {
+  Init();
+  const std::string oldToken = Settings().AuthToken.c_str();
+  VLTestDir dir;
+  VLWSAELog::InitWSLogs(0x1800, 2, dir.path().c_str());  // "soap_recv" and "soap_sent"
+  std::map<std::string, std::string> raw;
+  VL_LogSetObserver(
+      [](void* ctx, const char* area, int, const char* text, size_t len) {
+        (*static_cast<std::map<std::string, std::string>*>(ctx))[area].append(text, len);
+      },
+      &raw);
+  VLAnswer<VL_WS_AuthorizeDeviceResponse> answer;
+  ASSERT_EQ(VL_WS_OK, VL_WS_authorizeDevice(&m_Handle, kPinNumber, answer.Fresh()));
+  const std::string newToken = answer->AuthToken;
+  Call(VL_WS_removeAllMyPurchases, "alicepw");
+  VL_LogSetObserver(nullptr, nullptr);
+
+  const std::string& sent = raw["soap_sent"];
+  const std::string& received = raw["soap_recv"];
+  for (const std::string& secret : {oldToken, newToken, std::string("alicepw")}) {
+    EXPECT_EQ(std::string::npos, sent.find(secret)) << secret;
+    EXPECT_EQ(std::string::npos, received.find(secret)) << secret;
+  }
+  EXPECT_NE(std::string::npos, sent.find("<VL1:AuthToken>********</VL1:AuthToken>"));
+  EXPECT_NE(std::string::npos, sent.find("<VL1:password>********</VL1:password>"));
+  EXPECT_NE(std::string::npos, received.find("AuthToken>********</"));
+  EXPECT_NE(std::string::npos, sent.find("<VL1:DestinationUniqueID>00-11-22-33-44-55</VL1:DestinationUniqueID>"));
 }
 
 TEST_F(Account, DeactivationEmptiesTheToken) {

@@ -177,6 +177,40 @@ TEST_F(BoxArt, WithoutAnImageTheAnswerIsItsUrlAndNothingIsLeftBehind) {
   EXPECT_EQ(m_Dir / "t1003_203.jpg", Location(VL_WS_BOXART_203, "t1003_"));
 }
 
+// Only a JPEG image reaches the cache: a compressed, malformed or short body is refused, and a
+// cached image that is no JPEG is fetched again.
+TEST_F(BoxArt, OnlyJpegImagesAreKept) {
+  for (int cacheType : {2, 1}) {
+    SCOPED_TRACE(cacheType);
+    Init(cacheType);
+    std::string bytes;
+    for (const char* fault : {"gzip", "deflate", "malformed", "truncated", "badlength:-64"}) {
+      SCOPED_TRACE(fault);
+      Fault(std::string("/images/boxart/=") + fault + ",times=1");
+      EXPECT_EQ(VL_WS_E_NETWORK, Data(VL_WS_BOXART_102, "t1006_", &bytes));
+      EXPECT_EQ("", bytes);
+      EXPECT_FALSE(ReadRow("t1006_", VL_WS_BOXART_102).found);
+      EXPECT_TRUE(ImageFolderFiles(m_Dir.path()).empty());
+    }
+    ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_102, "t1006_", &bytes));
+    EXPECT_EQ(Served("t1006_", VL_WS_BOXART_102), bytes);
+
+    // A cached copy that is no image any more is a miss.
+    if (cacheType == 2) {
+      ASSERT_TRUE(VLWriteFile(m_Dir / "t1006_102.jpg", "<html>not an image</html>"));
+    } else {
+      Row row = ReadRow("t1006_", VL_WS_BOXART_102);
+      ASSERT_TRUE(m_Handle.client->m_Cache->WriteBoxArt("t1006_", VL_WS_BOXART_102, row.length, row.lastModified.c_str(),
+                                                        0, VLString(row.data.data(), row.data.size() / 2)));
+    }
+    m_Sim.ClearRequests();
+    ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_102, "t1006_", &bytes));
+    EXPECT_EQ(Served("t1006_", VL_WS_BOXART_102), bytes);
+    EXPECT_EQ(1u, Images(1).size());
+    VLFile::Remove((m_Dir / "t1006_102.jpg").c_str());
+  }
+}
+
 TEST_F(BoxArt, PrefixesWithAPathSeparatorAreNeverFiles) {
   std::string folder = m_Dir / "cache/";
   VL_WS_SetupParams params = Setup(2);

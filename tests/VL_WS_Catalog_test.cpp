@@ -6,6 +6,7 @@
 #include <sys/stat.h>
 
 #include <algorithm>
+#include <chrono>
 #include <functional>
 #include <string>
 #include <vector>
@@ -305,6 +306,29 @@ TEST_F(Catalog, TitlesWithoutClientStateOrRecord) {
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitles(nullptr, 1, 1, 5, 2, &page));
   VL_WS_release(&page);
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitles(&m_Handle, 1, 1, 5, 2, nullptr));
+}
+
+// The store answers page number and size in 16-bit fields: values beyond them never go out.
+TEST_F(Catalog, PagesBeyondSixteenBitsAreRefusedBeforeAnyRequest) {
+  const int genres[] = {1};
+  for (auto page : std::vector<std::pair<int, int>>{{1, 100000}, {32768, 5}, {-32769, 5}, {1, -100000}}) {
+    SCOPED_TRACE(std::to_string(page.first) + "," + std::to_string(page.second));
+    const int n = page.first, per = page.second;
+    std::vector<std::function<VL_WS_Status()>> calls = {
+        EmptyAnswer<VL_WS_TitlesResponse>([&](auto* r) { return VL_WS_getTitles(&m_Handle, 1, n, per, 2, r); }),
+        EmptyAnswer<VL_WS_TitlesResponseArray>(
+            [&](auto* r) { return VL_WS_getTitlesByGenreIDs(&m_Handle, 1, genres, n, per, 2, r); }),
+        EmptyAnswer<VL_WS_TitlesResponse>([&](auto* r) { return VL_WS_searchForTitle(&m_Handle, n, per, 2, 0, "a", r); }),
+        EmptyAnswer<VL_WS_TitlesResponse>(
+            [&](auto* r) { return VL_WS_searchForTitleDetail(&m_Handle, n, per, 2, 0, "a", r); }),
+        EmptyAnswer<VL_WS_MyVideosResponse>([&](auto* r) { return VL_WS_getMyVideos(&m_Handle, n, per, 2, 0, 0, r); }),
+        EmptyAnswer<VL_WS_WishlistItemsResponse>(
+            [&](auto* r) { return VL_WS_getWishlistItems(&m_Handle, static_cast<VL_WS_SortOrder>(0), n, per, 0, r); }),
+    };
+    for (auto& call : calls) EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, call());
+  }
+  EXPECT_TRUE(RequestsNow().empty());
+  EXPECT_EQ(VL_WS_OK, FetchTitles(32767));
 }
 
 TEST_F(Catalog, NavigationIsTheStoresGenreTreeKeptUnderTheEmptyKeyAndGenreLabelsFoldTheirCode) {
@@ -759,6 +783,37 @@ TEST_F(Catalog, TransportFaultOfEveryOperationLeavesAnEmptyRecordAndNothingKept)
     EXPECT_EQ(-1, Flag(1151));
     EXPECT_EQ(std::vector<std::string>{c.operation}, Sent(1));
   }
+}
+
+// Each wait for the answer is short, but the answer trickles in: the call ends at the deadline of
+// the whole exchange (send and receive time-out together, 1 + 1 s here) with the status a
+// receive time-out gives, SOAP call or hand-built request alike, and the handle works next.
+TEST_F(Catalog, ATricklingAnswerEndsAtTheDeadlineOfTheExchange) {
+  soap& context = m_Handle.client->m_RealTimeBrowse;
+  context.send_timeout = context.recv_timeout = 1;
+  const struct {
+    const char* fault;
+    VL_WS_Status status;
+    std::function<VL_WS_Status()> call;
+  } cases[] = {
+      {"getTitlesByNavigation=trickle:100,times=1", VL_WS_E_EOF, [&] { return FetchTitles(); }},
+      {"/images/boxart/=trickle:100,times=1", VL_WS_E_NETWORK,
+       [&] {
+         VL_WS_Image image;
+         VL_WS_Status status = VL_WS_getBoxArtImageData(&m_Handle, VL_WS_BOXART_321, "t1001_", &image);
+         EXPECT_EQ(nullptr, image.Data);
+         VL_WS_release(&image);
+         return status;
+       }},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.fault);
+    Fault(c.fault);
+    auto start = std::chrono::steady_clock::now();
+    EXPECT_EQ(c.status, c.call());
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10));
+  }
+  EXPECT_EQ(VL_WS_OK, FetchTitles());
 }
 
 TEST_F(Catalog, EveryOperationLogsOneResultLine) {

@@ -3,7 +3,10 @@
 // duplicates.
 #include <gtest/gtest.h>
 #include <string.h>
+#include <sys/socket.h>
 #include <sys/stat.h>
+#include <sys/un.h>
+#include <unistd.h>
 
 #include <string>
 #include <vector>
@@ -399,7 +402,7 @@ TEST_F(Client, CacheFileNameTellsDevicesKeysAccountsAndSettingsApart) {
   }
 }
 
-TEST_F(Client, DamagedCacheFileIsReplacedAndAnUnopenableOneFails) {
+TEST_F(Client, DamagedOrUnopenableCacheFileIsReplacedAndAFolderFails) {
   VLTestDir dir;
   VL_WS_SetupParams params = FileCache(dir.path());
   ASSERT_EQ(VL_WS_OK, Init(params));
@@ -410,6 +413,19 @@ TEST_F(Client, DamagedCacheFileIsReplacedAndAnUnopenableOneFails) {
   ASSERT_EQ(VL_WS_OK, Init(params));
   EXPECT_EQ(0u, VLReadFile(path).find("SQLite format 3"));
   EXPECT_TRUE(m_Handle.client->m_Cache->WriteMetaData("n", "k", "v"));
+  VL_WS_release(&m_Handle);
+
+  // A file this process cannot open (a socket: not even root may) is deleted too.
+  ASSERT_TRUE(VLFile::Remove(path.c_str()));
+  int fd = socket(AF_UNIX, SOCK_STREAM, 0);
+  struct sockaddr_un address = {};
+  address.sun_family = AF_UNIX;
+  ASSERT_LT(path.size(), sizeof address.sun_path);
+  strcpy(address.sun_path, path.c_str());
+  ASSERT_EQ(0, bind(fd, reinterpret_cast<sockaddr*>(&address), sizeof address));
+  close(fd);
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(0u, VLReadFile(path).find("SQLite format 3"));
   VL_WS_release(&m_Handle);
 
   // A folder in the file's place cannot be opened nor deleted.
@@ -552,6 +568,23 @@ TEST_F(Client, DuplicateOfAMemoryCacheHandleHasNoCacheAndReleasedHandlesAreEmpty
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
   EXPECT_TRUE(IsEmpty(m_Handle));
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
+}
+
+TEST_F(Client, ALiveHandleIsNeverMadeAnew) {
+  VL_WS_SetupParams params = VLTestSetupParams();
+  ASSERT_EQ(VL_WS_OK, Init(params));
+  VL_WS_Handle copy = {};
+  ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));
+  const VL_WS_Handle before = m_Handle, copyBefore = copy;
+
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_initialize(&m_Handle, &params));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&copy, &m_Handle));
+  EXPECT_EQ(before.tag, m_Handle.tag);
+  EXPECT_EQ(before.client, m_Handle.client);
+  EXPECT_EQ(copyBefore.client, copy.client);
+  VL_WS_EnvID env;
+  EXPECT_EQ(VL_WS_OK, VL_WS_getDeviceEnv(&m_Handle, &env));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
 }
 
 TEST(ClientInterface, VersionAndEnvironmentList) {

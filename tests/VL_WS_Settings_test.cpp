@@ -72,6 +72,9 @@ TEST(Settings, EveryFailureHasItsStatus) {
   EXPECT_EQ(VL_WS_E_FILE, ReadSetting(file, "A").status);
   ASSERT_TRUE(VLWriteFile(file, ""));
   EXPECT_EQ(VL_WS_E_SETTING_MISSING, ReadSetting(file, "A").status);
+  ASSERT_TRUE(VLWriteFile(file, "<DUDUVud><VL1:Configuration Key=\"A\">"));
+  EXPECT_EQ(VL_WS_E_SETTING_UNREADABLE, ReadSetting(file, "A").status);
+  ASSERT_TRUE(VLWriteFile(file, ""));
   ASSERT_EQ(VL_WS_OK, Write(file, "A", "1"));
   EXPECT_EQ(VL_WS_E_SETTING_MISSING, ReadSetting(file, "B").status);
 

@@ -12,6 +12,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <chrono>
 
 #include <openssl/err.h>
@@ -164,11 +165,16 @@ void VLTestServer::Handle(int fd) {
       pollfd p = {fd, POLLIN, 0};
       if (poll(&p, 1, 50) > 0 && readSome(buf, sizeof(buf)) <= 0) break;
     }
-  } else if (ssl) {
-    SSL_write(ssl, reply.data(), static_cast<int>(reply.size()));
-    SSL_shutdown(ssl);
   } else {
-    send(fd, reply.data(), reply.size(), MSG_NOSIGNAL);
+    size_t piece = behaviour == kPieces ? 8 : reply.size();
+    for (size_t at = 0; at < reply.size(); at += piece) {
+      if (at > 0) std::this_thread::sleep_for(std::chrono::milliseconds(2));
+      size_t n = std::min(piece, reply.size() - at);
+      if (ssl ? SSL_write(ssl, reply.data() + at, static_cast<int>(n)) <= 0
+              : send(fd, reply.data() + at, n, MSG_NOSIGNAL) < 0)
+        break;
+    }
+    if (ssl) SSL_shutdown(ssl);
   }
   SSL_free(ssl);
   ERR_clear_error();

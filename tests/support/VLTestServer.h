@@ -50,6 +50,8 @@ class VLTestServer {
     kReply,          // read the request, send the reply, close
     kHang,           // read the request and never answer (until the client leaves or Stop)
     kCloseAtOnce,    // close (with a reset) right after accepting / the TLS handshake
+    kPieces,         // as kReply, but send the reply in pieces of 8 bytes, 2 ms apart, so that
+                     // the client receives it in many reads, its header included
   };
 
   // A plain TCP server, or a TLS server with cert.
