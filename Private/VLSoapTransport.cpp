@@ -499,21 +499,28 @@ int NoSignalWrite(BIO* b, const char* data, int len) {
 
 int NoSignalPuts(BIO* b, const char* text) { return NoSignalWrite(b, text, static_cast<int>(strlen(text))); }
 
+BIO_METHOD* NewNoSignalMethod() {
+  const BIO_METHOD* sock = BIO_s_socket();
+  BIO_METHOD* m = BIO_meth_new(BIO_TYPE_SOCKET, "socket without SIGPIPE");
+  if (m) {
+    BIO_meth_set_write(m, NoSignalWrite);
+    BIO_meth_set_puts(m, NoSignalPuts);
+    BIO_meth_set_read(m, BIO_meth_get_read(sock));
+    BIO_meth_set_ctrl(m, BIO_meth_get_ctrl(sock));
+    BIO_meth_set_create(m, BIO_meth_get_create(sock));
+    BIO_meth_set_destroy(m, BIO_meth_get_destroy(sock));
+  }
+  return m;
+}
+
+// One method for the process, freed when the library is unloaded (a launcher may unload it and
+// go on).
 BIO_METHOD* NoSignalMethod() {
-  static BIO_METHOD* s_Method = [] {
-    const BIO_METHOD* sock = BIO_s_socket();
-    BIO_METHOD* m = BIO_meth_new(BIO_TYPE_SOCKET, "socket without SIGPIPE");
-    if (m) {
-      BIO_meth_set_write(m, NoSignalWrite);
-      BIO_meth_set_puts(m, NoSignalPuts);
-      BIO_meth_set_read(m, BIO_meth_get_read(sock));
-      BIO_meth_set_ctrl(m, BIO_meth_get_ctrl(sock));
-      BIO_meth_set_create(m, BIO_meth_get_create(sock));
-      BIO_meth_set_destroy(m, BIO_meth_get_destroy(sock));
-    }
-    return m;
-  }();
-  return s_Method;
+  static const struct Holder {
+    BIO_METHOD* method;
+    ~Holder() { BIO_meth_free(method); }
+  } s_Holder{NewNoSignalMethod()};
+  return s_Holder.method;
 }
 
 }  // namespace

@@ -2,6 +2,8 @@
 // beside the database, revalidation), the memory cache, no cache, failures and the proxy.
 #include <gtest/gtest.h>
 
+#include <stdint.h>
+
 #include <set>
 #include <string>
 #include <vector>
@@ -203,6 +205,7 @@ TEST_F(BoxArt, OnlyJpegImagesAreKept) {
       ASSERT_TRUE(m_Handle.client->m_Cache->WriteBoxArt("t1006_", VL_WS_BOXART_102, row.length, row.lastModified.c_str(),
                                                         0, VLString(row.data.data(), row.data.size() / 2)));
     }
+    m_Sim.WaitForRequests(SIZE_MAX, 200);  // the download above is logged just after its answer
     m_Sim.ClearRequests();
     ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_102, "t1006_", &bytes));
     EXPECT_EQ(Served("t1006_", VL_WS_BOXART_102), bytes);
