@@ -18,10 +18,12 @@ namespace {
 class Vlws : public testing::Test {
  protected:
   // vlws runs in processes of its own, so this program's simulator can be one that answers
-  // ReturnTimeout within the client's receive time-out.
+  // ReturnTimeout within the client's receive time-out. Its password holds a '#', which the
+  // settings file keeps.
   static void SetUpTestSuite() {
     VLSimOptions options;
     options.returnTimeoutSeconds = 1;
+    options.password = "vlsim#password";
     s_Sim = new VLSimServer(options);
     std::string error;
     ASSERT_TRUE(s_Sim->Start(&error)) << error;
@@ -35,9 +37,10 @@ class Vlws : public testing::Test {
     // The settings file gives the setup of the simulator's device; rows add the token.
     ASSERT_TRUE(VLWriteFile(m_Dir / "store.conf", "# the simulator\napi-key = " + sim.apiKey + "\nuser-name = " +
                                                       sim.userName + "\npassword=" + sim.password +
-                                                      "\ndevice-id = 00-11-22-33-44-55   # any device\n"
+                                                      "\n  # any device\ndevice-id = 00-11-22-33-44-55\n"
                                                       "device-type = 7\n"));
     m_Vars["dir"] = m_Dir.path();
+    m_Vars["password"] = sim.password;
     m_Vars["store"] = "--settings " + m_Dir / "store.conf";
   }
 
@@ -100,7 +103,7 @@ TEST_F(Vlws, EveryOperationAnswers) {
       {"device-id", 0, "\"Length\": 17"},
       {"server-time", 0, "\"serverTime\": "},
       // Catalogue; the first row has the setup as options instead of the settings file.
-      {"navigation --api-key VLSIM-API-KEY --user-name vlsim-user --password vlsim-password "
+      {"navigation --api-key VLSIM-API-KEY --user-name vlsim-user --password '{password}' "
        "--device-id 00-11-22-33-44-55", 0, "\"ParentId\": "},
       {"genre-label --genre 3 {store}", 0, "\"Label\": \"New Releases\""},
       {"titles --genre 3 --page 2 --items 5 {store}", 0, "\"CurrentPageNumber\": 2,\n  \"ItemsPerPage\": 5"},

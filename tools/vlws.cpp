@@ -122,7 +122,7 @@ class Args {
   void Set(const std::string& name, const std::string& value) { m_Values[name] = value; }
   bool Has(const std::string& name) const { return m_Values.count(name) != 0; }
 
-  // The value given, else the option's fallback (applied by Complete), else null.
+  // The value given, else the option's fallback (set by ParseArgs), else null.
   const char* Text(const char* name) const {
     auto found = m_Values.find(name);
     return found == m_Values.end() ? nullptr : found->second.c_str();
@@ -159,8 +159,8 @@ class Args {
 
 const std::vector<Option>& SetupOptions() {
   static const std::vector<Option> options = {
-      Optional(Text("settings", "a file of \"name = value\" lines (names of the options below, '#' starts a "
-                                "comment); an option given on the command line wins")),
+      Optional(Text("settings", "a file of \"name = value\" lines (names of the options below; lines starting "
+                                "with '#' are comments); an option given on the command line wins")),
       Text("api-key", "the application's API key (APIKey)"),
       Text("user-name", "WS-Security user name (UserName)"),
       Text("password", "WS-Security password (Password)"),
@@ -235,12 +235,12 @@ bool ReadSettingsFile(const std::string& path, Args* args, std::string* error) {
   std::string line;
   for (int number = 1; std::getline(in, line); ++number) {
     std::string where = path + ":" + std::to_string(number) + ": ";
-    line = Trim(line.substr(0, line.find('#')));
-    if (line.empty()) continue;
+    line = Trim(line);
+    if (line.empty() || line[0] == '#') continue;  // a value may hold '#', as a password may
     size_t equals = line.find('=');
     std::string name = Trim(line.substr(0, equals));
     const Option* option = FindOption(SetupOptions(), name);
-    if (equals == std::string::npos || !option || name == "settings" || option->kind == Kind::kFlag) {
+    if (equals == std::string::npos || !option || name == "settings") {
       *error = where + "expected \"name = value\" with the name of a setup option, not \"" + line + "\"";
       return false;
     }
@@ -341,9 +341,10 @@ std::string DescribeStatus(VL_WS_Status status, const char* function) {
   }
   if (status <= VL_WS_E_SOAP && status > VL_WS_E_SOAP - 100) {
     int error = VL_WS_E_SOAP - status;
-    return "VL_WS_E_SOAP_FAULT(" + std::to_string(error) + ")" + number + "the SOAP exchange failed (" +
-           (error == 1 ? "a client fault" : error == 2 ? "a fault of the store" : "SOAP runtime error " + std::to_string(error)) +
-           ")";
+    std::string what = error == 1   ? "a client fault"
+                       : error == 2 ? "a fault of the store"
+                                    : "SOAP runtime error " + std::to_string(error);
+    return "VL_WS_E_SOAP_FAULT(" + std::to_string(error) + ")" + number + "the SOAP exchange failed (" + what + ")";
   }
   if (status <= VL_WS_E_HTTP && status > VL_WS_E_HTTP - 600) {
     int error = VL_WS_E_HTTP - status;
@@ -410,7 +411,8 @@ void WriteResult(VLJsonWriter* json, const char* key, const R& result) {
   }
 }
 
-// An operation whose result is a plain value, written as {"key": value}.
+// A row of the table. key names the value of a plain result (bool, int, ...), written as
+// {"key": value}; records are written by VLJsonValue.
 template <class Call>
 Operation Op(const char* name, const char* function, const char* summary, std::vector<Option> options,
              const char* key, Call call) {
@@ -433,7 +435,7 @@ Operation Op(const char* name, const char* function, const char* summary, std::v
   return {name, function, summary, std::move(options), Of::kHandle, run};
 }
 
-// An operation that fills a record (or nothing).
+// A row whose call fills a record (or nothing).
 template <class Call>
 Operation Op(const char* name, const char* function, const char* summary, std::vector<Option> options, Call call) {
   static_assert(!std::is_arithmetic_v<typename CallOf<Call>::Type>, "a plain result needs the key of its value");
@@ -891,7 +893,7 @@ int main(int argc, char** argv) {
     return kExitUsage;
   }
   std::string name = argv[1];
-  if (name == "--help" || name == "-h" || name == "help") {
+  if (name == "--help" || name == "-h") {
     Usage(stdout);
     return 0;
   }
