@@ -5,6 +5,7 @@
 #include <stdlib.h>
 #include <string.h>
 
+#include <cmath>
 #include <new>
 
 #include "ASObject.h"
@@ -101,10 +102,15 @@ void PathFromEnvironment(const AEString& name, const char* label, const char* fa
 // A setting's argument: the argument at index of a call as text.
 AEString TextArgument(ae::stagecraft::ASValueArray& arguments, size_t index) { return arguments.Get(index).AsString(); }
 
-// The environment number of selectEnv and clearEnv: their only argument, which must be a number.
+// The environment number of selectEnv and clearEnv: their only argument, a number or a text that
+// holds one (what read returns), converted as the engine converts a value to an integer. An empty
+// text, such as read's answer for a missing setting, names no environment.
 bool EnvArgument(ae::stagecraft::ASValueArray& arguments, int* env) {
-  if (arguments.Count() != 1 || !arguments.Get(0).IsNumber()) return false;
-  *env = arguments.Get(0).AsInteger();
+  if (arguments.Count() != 1) return false;
+  const ae::stagecraft::ASValue& value = arguments.Get(0);
+  bool numericText = value.IsString() && !value.AsString().IsEmpty() && !std::isnan(value.AsNumber());
+  if (!value.IsNumber() && !numericText) return false;
+  *env = value.AsInteger();
   return true;
 }
 

@@ -235,7 +235,7 @@ TEST_F(CfgMovie, SelectEnvSwitchesAmongTheEnvironmentFiles) {
   EXPECT_TRUE(Logged("4:VLCfgLibAE::selectEnv m_SettingsFile = ./stgapiffpreference.xml"));
   EXPECT_EQ("true", Eval("cfg.write('Volume', 'stgapi', false)"));
   EXPECT_EQ("stgapi", Setting(Path("stgapiffpreference.xml"), "Volume"));
-  EXPECT_EQ("true", Eval("cfg.selectEnv(2)"));
+  EXPECT_EQ("true", Eval("cfg.selectEnv('2')"));  // a number as read gives it
   EXPECT_EQ("true", Eval("cfg.write('Volume', 'production', false)"));
   EXPECT_EQ("production", Setting(Path("productionffpreference.xml"), "Volume"));
   EXPECT_EQ("true", Eval("cfg.selectEnv(3)"));
@@ -243,7 +243,8 @@ TEST_F(CfgMovie, SelectEnvSwitchesAmongTheEnvironmentFiles) {
   EXPECT_EQ("\"\"", Eval("cfg.read('Volume', false)"));
 
   for (const char* bad :
-       {"cfg.selectEnv(4)", "cfg.selectEnv(-1)", "cfg.selectEnv('x')", "cfg.selectEnv()", "cfg.selectEnv(1, 2)"})
+       {"cfg.selectEnv(4)", "cfg.selectEnv(-1)", "cfg.selectEnv('x')", "cfg.selectEnv('')", "cfg.selectEnv()",
+        "cfg.selectEnv(1, 2)"})
     EXPECT_EQ("false", Eval(bad)) << bad;
   EXPECT_TRUE(LogMentions("There is no environment 4"));
 }
