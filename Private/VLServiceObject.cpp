@@ -36,5 +36,11 @@ int VLServiceBinding::AddRequestHeader(VLSoapProxy* proxy, const VL_WS_SetupPara
   VLString messageId = "uuid:" + operation;
   VLString action = VL_API_NAMESPACE + operation;
   if (soap_wsa_request(proxy, messageId.c_str(), endpoint.c_str(), action.c_str()) != SOAP_OK) return proxy->error;
-  return soap_wsse_add_UsernameTokenDigest(proxy, "User", params.UserName.c_str(), params.Password.c_str());
+  int error = soap_wsse_add_UsernameTokenDigest(proxy, "User", params.UserName.c_str(), params.Password.c_str());
+  if (error != SOAP_OK) return error;
+  // The store's request layout has the nonce as plain Base64 text, without the encoding attribute
+  // the plug-in writes.
+  _wsse__UsernameToken* token = soap_wsse_UsernameToken(proxy, "User");
+  if (token && token->Nonce) token->Nonce->EncodingType = NULL;
+  return SOAP_OK;
 }

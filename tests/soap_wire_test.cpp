@@ -32,7 +32,7 @@ Token TokenOf(const std::string& body) {
   std::smatch m;
   Token t;
   if (std::regex_search(body, m, std::regex("#PasswordDigest\">([^<]*)</wsse:Password>"))) t.password = m[1];
-  if (std::regex_search(body, m, std::regex("Base64Binary\">([^<]*)</wsse:Nonce>"))) t.nonce = m[1];
+  if (std::regex_search(body, m, std::regex("<wsse:Nonce>([^<]*)</wsse:Nonce>"))) t.nonce = m[1];
   if (std::regex_search(body, m, std::regex("<wsu:Created>([^<]*)</wsu:Created>"))) t.created = m[1];
   return t;
 }
@@ -131,7 +131,7 @@ TEST_F(SoapWire, GoldenCatalogueRequest) {
       "<wsse:Security SOAP-ENV:mustUnderstand=\"1\"><wsse:UsernameToken wsu:Id=\"User\">"
       "<wsse:Username>user</wsse:Username>"
       "<wsse:Password Type=\"http://docs.oasis-open.org/wss/2004/01/oasis-200401-wss-username-token-profile-1.0#PasswordDigest\">" + t.password + "</wsse:Password>"
-      "<wsse:Nonce EncodingType=\"http://docs.oasis-open.org/wss/2004/01/oasis-200401-wss-soap-message-security-1.0#Base64Binary\">" + t.nonce + "</wsse:Nonce>"
+      "<wsse:Nonce>" + t.nonce + "</wsse:Nonce>"
       "<wsu:Created>" + t.created + "</wsu:Created></wsse:UsernameToken></wsse:Security>"
       "<wsa:MessageID>uuid:searchForTitle</wsa:MessageID>"
       "<wsa:ReplyTo SOAP-ENV:mustUnderstand=\"1\"><wsa:Address>http://schemas.xmlsoap.org/ws/2004/08/addressing/role/anonymous</wsa:Address></wsa:ReplyTo>"
