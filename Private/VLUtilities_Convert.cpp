@@ -25,14 +25,14 @@ char* ExpireDate(const char* dateTime) {
 }
 
 // Gives the client array one tagged element per schema element and converts each. A missing or
-// empty schema array leaves the client array empty; a missing element leaves its slot empty.
+// empty schema array leaves the client array empty; a nil element is converted as an empty one, so
+// that its texts are owned empty texts like those of every other element.
 template <class SchemaItem, class Array, class Convert>
 void ConvertItems(SchemaItem* const* items, int count, Array& array, Convert convert) {
   if (items == 0 || count < 1) return;
   VLRecordNewItems(array, count);
-  for (int i = 0; i < count; ++i) {
-    if (items[i] != 0) convert(items[i], array.Items[i]);
-  }
+  const SchemaItem empty;
+  for (int i = 0; i < count; ++i) convert(items[i] != 0 ? items[i] : &empty, array.Items[i]);
 }
 
 void ConvertBonusAssets(const VL1__ArrayOfBonusAsset* t, VL_WS_BonusAssetArray& r) {

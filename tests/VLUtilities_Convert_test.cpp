@@ -70,6 +70,15 @@ TEST_F(Convert, MissingElementsBecomeOwnedEmptyTextsAndEmptyTaggedArrays) {
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&page));
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&page));
 
+  // A nil title is an empty one, with owned empty texts.
+  From(soap_new_VL1__GetTitlesResponse(m_Soap),
+       E("Titles", "<VL1:TitleListing xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" xsi:nil=\"true\"/>"),
+       VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, page);
+  ASSERT_EQ(1, page.Titles.Count);
+  EXPECT_STREQ("", page.Titles.Items[0].TitleName);
+  EXPECT_STREQ("", page.Titles.Items[0].BoxArtPrefix);
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&page));
+
   // Titles empty or missing: no array, but its cell.
   for (const char* titles : {"<VL1:Titles/>", ""}) {
     From(soap_new_VL1__GetTitlesResponse(m_Soap), E("ResponseCode", "0") + titles,
