@@ -1,5 +1,7 @@
 #include "VLSoapProxy.h"
 
+#include <string.h>
+
 #include <sys/socket.h>
 
 #include "VLSoapTransport.h"
@@ -70,6 +72,26 @@ int VLSoapProxy::Send(const char* endpoint, const char* action, const char* requ
   return SOAP_OK;
 }
 
+namespace {
+
+// The runtime tells a server's fault from a client's only when the answer writes the envelope's
+// namespace with the runtime's own prefix. The fault code it has read is a qualified name already
+// turned to the runtime's prefix of that namespace, so the kind is told from it whatever prefix the
+// store chose, in either SOAP version.
+int FaultKind(soap* s, int error) {
+  const char* code = error == SOAP_FAULT ? *soap_faultcode(s) : NULL;
+  if (!code) return error;
+  if (strcmp(code, "SOAP-ENV:Server") == 0 || strcmp(code, "SOAP-ENV:Receiver") == 0) {
+    return s->error = SOAP_SVR_FAULT;
+  }
+  if (strcmp(code, "SOAP-ENV:Client") == 0 || strcmp(code, "SOAP-ENV:Sender") == 0) {
+    return s->error = SOAP_CLI_FAULT;
+  }
+  return error;
+}
+
+}  // namespace
+
 int VLSoapProxy::Receive(const char* responseTag, const Body& body) {
   body.reset(this, body.response);
   if (soap_begin_recv(this) || soap_envelope_begin_in(this) || soap_recv_header(this) ||
@@ -77,7 +99,7 @@ int VLSoapProxy::Receive(const char* responseTag, const Body& body) {
     return soap_closesock(this);
   body.get(this, body.response, responseTag);
   // Another element than the response at body level is read as a fault.
-  if (error) return soap_recv_fault(this, 0);
+  if (error) return FaultKind(this, soap_recv_fault(this, 0));
   if (soap_body_end_in(this) || soap_envelope_end_in(this) || soap_end_recv(this)) return soap_closesock(this);
   return soap_closesock(this);
 }

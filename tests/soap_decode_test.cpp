@@ -160,11 +160,25 @@ TEST_F(SoapDecode, FaultsAndHttpStatuses) {
                                                           "<faultstring>Store is down</faultstring></SOAP-ENV:Fault>"),
                                    "500 Internal Server Error");
   };
+  // The same codes under other prefixes of the envelope's namespace, in both SOAP versions.
+  auto other = [](const std::string& envelope, const std::string& fault) {
+    return VLTestServer::HttpReply("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<e:Envelope xmlns:e=\"" + envelope +
+                                       "\"><e:Body><e:Fault>" + fault + "</e:Fault></e:Body></e:Envelope>",
+                                   "500 Internal Server Error");
+  };
+  const std::string v11 = "http://schemas.xmlsoap.org/soap/envelope/", v12 = "http://www.w3.org/2003/05/soap-envelope";
+  auto code12 = [](const std::string& code) {
+    return "<e:Code><e:Value>" + code + "</e:Value></e:Code><e:Reason><e:Text xml:lang=\"en\">Store is down</e:Text></e:Reason>";
+  };
   const struct {
     std::string reply;
     int code;
   } cases[] = {{fault("SOAP-ENV:Server"), SOAP_SVR_FAULT},
                {fault("VL1:Throttled"), SOAP_FAULT},
+               {other(v11, "<faultcode>e:Server</faultcode><faultstring>Store is down</faultstring>"), SOAP_SVR_FAULT},
+               {other(v11, "<faultcode>e:Client</faultcode><faultstring>Store is down</faultstring>"), SOAP_CLI_FAULT},
+               {other(v12, code12("e:Receiver")), SOAP_SVR_FAULT},
+               {other(v12, code12("e:Sender")), SOAP_CLI_FAULT},
                {VLTestServer::HttpReply("<html>gone</html>", "404 Not Found"), 404}};
   for (const auto& c : cases) {
     m_Server.SetReply(c.reply);
