@@ -15,6 +15,7 @@
 #include <time.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <mutex>
 #include <new>
 
@@ -50,47 +51,81 @@ class RawLog {
     m_Prev = 0;
   }
 
+  // Jumps from tag to tag; the bytes are copied only around a masked value, and a block without
+  // one is logged as it is.
   void Write(const char* data, size_t n) {
-    VLString text;
-    for (const char* c = data; c < data + n; m_Prev = *c++) {
-      if (m_InSecret && *c != '<') {
-        if (!m_Masked) text += kMask;
-        m_Masked = true;
-        continue;
+    VLString masked;
+    const char* kept = data;  // the first byte not yet copied into masked
+    const char* c = data;
+    const char* end = data + n;
+    while (c < end) {
+      if (m_InSecret) {
+        const char* next = Find(c, end, '<');
+        if (next > c) {  // one mask stands for the whole value
+          masked.append(kept, c - kept);
+          if (!m_Masked) masked += kMask;
+          m_Masked = true;
+          m_Prev = next[-1];
+          c = kept = next;
+          continue;
+        }
+        m_InSecret = false;
       }
-      m_InSecret = false;
-      text += *c;
+      const char* next = m_InTag ? std::min(Find(c, end, '<'), Find(c, end, '>')) : Find(c, end, '<');
+      if (m_InTag) {
+        size_t take = std::min(static_cast<size_t>(next - c), sizeof(m_Tag) - m_TagLength);
+        memcpy(m_Tag + m_TagLength, c, take);
+        m_TagLength += take;
+      }
+      if (next > c) m_Prev = next[-1];
+      c = next;
+      if (c == end) break;
       if (*c == '<') {
         m_InTag = true;
-        m_Tag = VLString();
-      } else if (m_InTag && *c == '>') {
+        m_TagLength = 0;
+      } else {  // the ">" that ends a tag
         m_InTag = false;
-        m_InSecret = m_Prev != '/' && IsSecretName(m_Tag);
+        m_InSecret = m_Prev != '/' && IsSecretName(m_Tag, m_TagLength);
         m_Masked = false;
-      } else if (m_InTag && m_Tag.length() < kNameLimit) {
-        m_Tag += *c;
       }
+      m_Prev = *c++;
     }
-    VL_LogOutputwithLen(*m_Area, 4, text.c_str(), static_cast<int>(text.length()));
+    if (kept == data) {
+      VL_LogOutputwithLen(*m_Area, 4, data, static_cast<int>(n));
+    } else {
+      masked.append(kept, end - kept);
+      VL_LogOutputwithLen(*m_Area, 4, masked.c_str(), static_cast<int>(masked.length()));
+    }
   }
 
  private:
   static constexpr const char* kMask = "********";
-  static const size_t kNameLimit = 64;  // more than any name looked for, prefix included
+
+  // The first byte ch in [c, end), or end.
+  static const char* Find(const char* c, const char* end, char ch) {
+    const void* found = memchr(c, ch, static_cast<size_t>(end - c));
+    return found ? static_cast<const char*>(found) : end;
+  }
+
+  static bool IsNameEnd(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '/' || c == '\0'; }
 
   // Whether the start of a tag's text (after its "<") names a secret element.
-  static bool IsSecretName(const VLString& tag) {
-    size_t length = strcspn(tag.c_str(), " \t\r\n/");
-    const char* colon = static_cast<const char*>(memrchr(tag.c_str(), ':', length));
-    const char* local = colon ? colon + 1 : tag.c_str();
-    size_t localLength = length - static_cast<size_t>(local - tag.c_str());
+  static bool IsSecretName(const char* tag, size_t tagLength) {
+    size_t length = 0;
+    while (length < tagLength && !IsNameEnd(tag[length])) ++length;
+    const char* colon = static_cast<const char*>(memrchr(tag, ':', length));
+    const char* local = colon ? colon + 1 : tag;
+    size_t localLength = length - static_cast<size_t>(local - tag);
     for (const char* secret : {"AuthToken", "password"})
       if (localLength == strlen(secret) && memcmp(local, secret, localLength) == 0) return true;
     return false;
   }
 
   const int* m_Area;  // one of the exported area ids, which are registered after construction
-  VLString m_Tag;     // the first bytes of the tag being read, after its "<"
+  // The first bytes of the tag being read, after its "<": more than any name looked for, prefix
+  // included.
+  char m_Tag[64];
+  size_t m_TagLength = 0;
   bool m_InTag = false;
   bool m_InSecret = false;  // within the value of a secret element
   bool m_Masked = false;    // the mask of that value is written
