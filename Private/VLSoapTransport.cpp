@@ -71,7 +71,8 @@ class RawLog {
         }
         m_InSecret = false;
       }
-      const char* next = m_InTag ? std::min(Find(c, end, '<'), Find(c, end, '>')) : Find(c, end, '<');
+      // Within a tag, a "<" before its ">" starts another tag.
+      const char* next = m_InTag ? Find(c, Find(c, end, '>'), '<') : Find(c, end, '<');
       if (m_InTag) {
         size_t take = std::min(static_cast<size_t>(next - c), sizeof(m_Tag) - m_TagLength);
         memcpy(m_Tag + m_TagLength, c, take);
