@@ -29,8 +29,8 @@ BASELINE_INSTRUCTIONS = 13.3e6
 rows = []
 
 
-def row(figure, median, unit, ratio=None, goal=None, met=None, note=''):
-    rows.append({'figure': figure, 'median': median, 'unit': unit, 'ratio': ratio, 'goal': goal,
+def row(figure, median, unit, ratio=None, judged_by=None, met=None, note=''):
+    rows.append({'figure': figure, 'median': median, 'unit': unit, 'ratio': ratio, 'judged_by': judged_by,
                  'met': met, 'note': note})
 
 
@@ -326,7 +326,7 @@ def main():
     for r in rows:
         met = {True: 'met', False: 'MISSED', None: ''}[r['met']]
         print('%-52s %12s %9s  %-42s %s' % (r['figure'], shown(r['median'], r['unit']),
-                                            '' if r['ratio'] is None else '%.3g' % r['ratio'], r['goal'] or '', met))
+                                            '' if r['ratio'] is None else '%.3g' % r['ratio'], r['judged_by'] or '', met))
         if r['note']:
             print('%-52s %s' % ('', r['note']))
     print('JSON: %s' % os.path.join(BENCH, 'results.json'))
