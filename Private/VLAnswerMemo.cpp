@@ -2,9 +2,13 @@
 
 #include <algorithm>
 
-VLAnswerMemo::VLAnswerMemo() : m_Context(new Serializer(false, false)) {}
+VLAnswerMemo::VLAnswerMemo() : m_Records(soap_new()) {}
 
-VLAnswerMemo::~VLAnswerMemo() {}
+VLAnswerMemo::~VLAnswerMemo() {
+  soap_destroy(m_Records);
+  soap_end(m_Records);
+  soap_free(m_Records);
+}
 
 const void* VLAnswerMemo::Find(const char* name, const VLString& key, const std::type_info& type,
                                const VLString& value) {
@@ -16,11 +20,11 @@ const void* VLAnswerMemo::Find(const char* name, const VLString& key, const std:
 }
 
 void VLAnswerMemo::MakeRoom() {
-  if (m_Decoded < kCapacity) return;
+  if (m_Kept < kCapacity) return;
   m_Entries.clear();
-  soap_destroy(m_Context.get());
-  soap_end(m_Context.get());
-  m_Decoded = 0;
+  soap_destroy(m_Records);
+  soap_end(m_Records);
+  m_Kept = 0;
 }
 
 void VLAnswerMemo::Add(const char* name, const VLString& key, const std::type_info& type, const VLString& value,

@@ -4,9 +4,8 @@
 // (or stored as): a hit compares the text the cache holds now with them, so the memo never
 // answers anything the cache does not hold.
 //
-// The records live in the memo's own SOAP context, which also decodes the texts it has no record
-// for. It keeps at most kCapacity records and then starts afresh: a context frees its records
-// only all together. Handles on several threads share one memo (the page prefetch stores the
+// The records live in the memo's own SOAP context. It keeps at most kCapacity records and then
+// starts afresh: a context frees its records only all together. Handles on several threads share one memo (the page prefetch stores the
 // pages that the main handle reads next); every use holds its lock.
 #ifndef VLANSWERMEMO_H
 #define VLANSWERMEMO_H
@@ -59,9 +58,9 @@ class VLAnswerMemo {
            const void* record);
 
   std::mutex m_Mutex;
-  std::unique_ptr<Serializer> m_Context;  // decodes, and owns every record kept
+  soap* m_Records;  // owns every record kept
   std::vector<Entry> m_Entries;
-  size_t m_Decoded = 0;  // records made in the context since it was last emptied
+  size_t m_Kept = 0;  // records kept since the context was last emptied
 };
 
 template <class Response, class Reader>
@@ -70,11 +69,15 @@ bool VLAnswerMemo::Use(const char* name, const VLString& key, const VLString& va
   std::lock_guard<std::mutex> lock(m_Mutex);
   const Response* record = static_cast<const Response*>(Find(name, key, typeid(Response), value));
   if (record == nullptr) {
+    // A new decoder each time: an input pass that fails may leave the runtime's state behind
+    // (an inflate stream still open, for one).
+    std::unique_ptr<Serializer> decoder(new Serializer(false, false));
+    Response* decoded = newResponse(decoder.get(), -1);
+    decoder->SetXML(value);
+    if (decoded == nullptr || decoder->Get(*decoded) != SOAP_OK) return false;
     MakeRoom();
-    ++m_Decoded;  // a failed decoding leaves its allocations in the context, too
-    Response* decoded = newResponse(m_Context.get(), -1);
-    m_Context->SetXML(value);
-    if (decoded == nullptr || m_Context->Get(*decoded) != SOAP_OK) return false;
+    ++m_Kept;
+    soap_delegate_deletion(decoder.get(), m_Records);
     Add(name, key, typeid(Response), value, decoded);
     record = decoded;
   }
@@ -86,8 +89,8 @@ void VLAnswerMemo::Keep(const char* name, const VLString& key, const VLString& v
                         soap* owner) {
   std::lock_guard<std::mutex> lock(m_Mutex);
   MakeRoom();
-  ++m_Decoded;
-  soap_delegate_deletion(owner, m_Context.get());
+  ++m_Kept;
+  soap_delegate_deletion(owner, m_Records);
   Add(name, key, typeid(Response), value, response);
 }
 
