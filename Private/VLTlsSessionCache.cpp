@@ -8,6 +8,10 @@ namespace {
 
 class Sessions {
  public:
+  ~Sessions() {
+    for (auto& kept : m_Sessions) SSL_SESSION_free(kept.second);
+  }
+
   SSL_SESSION* Get(const std::string& key) {
     std::lock_guard<std::mutex> lock(m_Mutex);
     auto it = m_Sessions.find(key);
@@ -37,11 +41,10 @@ class Sessions {
   std::map<std::string, SSL_SESSION*> m_Sessions;  // by "host:port", a handful at most
 };
 
-// Never destroyed: a context may still close a connection, and keep its session, while static
-// objects are destroyed at exit.
+// Destroyed when the library is unloaded or the process ends, when no handle is left.
 Sessions& TheSessions() {
-  static Sessions* s_Sessions = new Sessions;
-  return *s_Sessions;
+  static Sessions s_Sessions;
+  return s_Sessions;
 }
 
 std::string Key(const char* host, int port) { return std::string(host) + ":" + std::to_string(port); }
