@@ -2,6 +2,7 @@
 #include "CacheMgr.h"
 
 #include <sqlite3.h>
+#include <sys/stat.h>
 #include <time.h>
 
 #include "VLAssert.h"
@@ -100,7 +101,7 @@ VLString FlagKey(int titleID) {
 
 }  // namespace
 
-// Opens the connection for one operation and closes it again (a memory database stays open).
+// The connection of one operation: open (or opened anew) before it, and its statement ended after it.
 class CacheMgr::ScopedConnection {
  public:
   explicit ScopedConnection(CacheMgr& cache) : m_Cache(cache), m_Open(cache.OpenConnection() == SQLITE_OK) {}
@@ -181,7 +182,10 @@ void CacheMgr::SplitBudget() {
 }
 
 int CacheMgr::OpenConnection() {
-  if (m_DB != 0) return SQLITE_OK;  // a memory database between operations
+  if (m_DB != 0) {
+    if (m_CacheType != kFileCache || IsOpenFile()) return SQLITE_OK;
+    CloseConnection(true);  // the file was removed or replaced since
+  }
   int rc;
   switch (m_CacheType) {
     case 0:
@@ -196,14 +200,36 @@ int CacheMgr::OpenConnection() {
       return SQLITE_MISUSE;
   }
   if (rc == SQLITE_OK) rc = sqlite3_busy_handler(m_DB, BusyWait, 0);
+  if (rc == SQLITE_OK && m_CacheType == kFileCache) {
+    struct stat file;
+    m_FileId[0] = m_FileId[1] = 0;
+    if (stat(m_Path.c_str(), &file) == 0) {
+      m_FileId[0] = file.st_dev;
+      m_FileId[1] = file.st_ino;
+    }
+  }
   if (rc != SQLITE_OK) CloseConnection(true);  // a failed open may still have made a handle
   return rc;
 }
 
+// Another cache object replaces a damaged database, and the client removes a file it cannot
+// open: a connection kept to the file that went would read and write where nobody looks.
+bool CacheMgr::IsOpenFile() const {
+  struct stat file;
+  return stat(m_Path.c_str(), &file) == 0 && file.st_dev == m_FileId[0] && file.st_ino == m_FileId[1];
+}
+
 int CacheMgr::CloseConnection(bool force) {
   if (m_DB == 0) return SQLITE_OK;
-  Finalize();
-  if (!force && m_CacheType != kFileCache) return SQLITE_OK;
+  EndStatement();
+  if (!force) {
+    // The next operation reads the file afresh: it sees at once what another program wrote to
+    // it, or damaged, and an idle handle holds none of its pages.
+    if (m_CacheType == kFileCache) sqlite3_db_release_memory(m_DB);
+    return SQLITE_OK;
+  }
+  for (auto& kept : m_Statements) sqlite3_finalize(kept.second);
+  m_Statements.clear();
   int rc = sqlite3_close(m_DB);
   m_DB = 0;
   return rc;
@@ -239,13 +265,22 @@ int CacheMgr::CreateSchema() {
 bool CacheMgr::Caches(int kind) const { return m_Opened && (m_CacheData & kind) != 0; }
 
 // ---- Statements -------------------------------------------------------------------------------
-// Every statement is finalised before the next one starts, so that no read transaction is left
-// open while the connection writes: with one open, SQLite could not wait for a writer on another
-// connection and would fail at once instead of waiting for the busy timeout.
+// Each statement is prepared once per connection and kept. Every statement is reset before the
+// next one starts, so that no read transaction is left open while the connection writes, or
+// between operations: with one open, SQLite could not wait for a writer on another connection
+// and would fail at once instead of waiting for the busy timeout.
 
 int CacheMgr::Prepare(const char* sql) {
-  Finalize();
-  return Noted(sqlite3_prepare_v2(m_DB, sql, -1, &m_Stmt, 0));
+  EndStatement();
+  for (auto& kept : m_Statements) {
+    if (kept.first == sql) {
+      m_Stmt = kept.second;
+      return SQLITE_OK;
+    }
+  }
+  int rc = Noted(sqlite3_prepare_v2(m_DB, sql, -1, &m_Stmt, 0));
+  if (rc == SQLITE_OK) m_Statements.emplace_back(sql, m_Stmt);
+  return rc;
 }
 
 int CacheMgr::Step() { return Noted(sqlite3_step(m_Stmt)); }
@@ -255,9 +290,10 @@ int CacheMgr::Noted(int rc) {
   return rc;
 }
 
-void CacheMgr::Finalize() {
+void CacheMgr::EndStatement() {
   if (m_Stmt == 0) return;
-  sqlite3_finalize(m_Stmt);
+  sqlite3_reset(m_Stmt);
+  sqlite3_clear_bindings(m_Stmt);
   m_Stmt = 0;
 }
 
@@ -288,7 +324,7 @@ int CacheMgr::Execute(const char* sql, VLString* text, unsigned int* number) {
     }
     if (rc == SQLITE_ROW || rc == SQLITE_DONE) rc = SQLITE_OK;
   }
-  Finalize();
+  EndStatement();
   return rc;
 }
 
@@ -333,7 +369,7 @@ void CacheMgr::LimitHandler(int kind) {
     while (deleted && (rc = Step()) == SQLITE_ROW && count < kEvictionBatch) {
       ColumnText(0, prefixes[count++]);
     }
-    Finalize();
+    EndStatement();
     deleted = deleted && rc == SQLITE_DONE && Execute(kDeleteOldestBoxArt, 0, 0) == SQLITE_OK &&
               Execute(kCommit, 0, 0) == SQLITE_OK;
     if (!deleted) {
@@ -426,7 +462,7 @@ bool CacheMgr::PurgeUserData(const VLString& name) {
       BindText(1, name);
       purged = Step() == SQLITE_DONE;
     }
-    Finalize();
+    EndStatement();
   }
   if ((m_CacheData & kMetaData) && (name.empty() || name == kWishlistFlag)) {
     for (const char* statement : kDeleteTitleAnswers) Execute(statement, 0, 0);

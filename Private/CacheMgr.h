@@ -5,16 +5,22 @@
 // The total byte budget is split between the three kinds of data; a write that finds its kind
 // over budget first evicts (see LimitHandler).
 //
-// A file database is opened and closed around every operation, so several CacheMgr objects (one
-// per client handle, each used by one thread) can share the file: SQLite's file locks serialise
-// them, with a busy timeout of 10 seconds. A memory database lives from Open to Close and
-// belongs to its one object.
+// A database stays open from Open to Close, with its statements prepared once, but holds no lock
+// between operations, so several CacheMgr objects (one per client handle, each used by one
+// thread) can share a file: SQLite's file locks serialise them, with a busy timeout of 10
+// seconds. Before each operation an object checks that its path still names the file it has
+// open, and opens the path anew when the file was removed or replaced. A memory database belongs
+// to its one object.
 //
 // A database that SQLite reports as damaged (corrupt, or not a database) in any operation is
 // deleted and made anew, empty, when that operation ends: the operation misses, the ones after
 // it work again. A cache must never keep answering from, or failing on, a damaged file.
 #ifndef CACHEMGR_H
 #define CACHEMGR_H
+
+#include <string>
+#include <utility>
+#include <vector>
 
 #include "CacheInterface.h"
 #include "VLString.h"
@@ -70,7 +76,9 @@ class CacheMgr : public CacheInterface {
   bool Caches(int kind) const;
   void SplitBudget();
   int OpenConnection();
+  // Ends the operation's statement; with force also closes the connection.
   int CloseConnection(bool force);
+  bool IsOpenFile() const;
   int CreateSchema();
   // Replaces the damaged database with a new, empty one.
   void Recreate();
@@ -80,7 +88,7 @@ class CacheMgr : public CacheInterface {
   int Prepare(const char* sql);
   int Step();
   int Noted(int rc);
-  void Finalize();
+  void EndStatement();
   void BindText(int index, const VLString& text);
   void ColumnText(int index, VLString& text);
   int Execute(const char* sql, VLString* text, unsigned int* number);
@@ -97,6 +105,8 @@ class CacheMgr : public CacheInterface {
   bool m_Damaged;  // SQLite reported the database as damaged during the operation under way
   sqlite3* m_DB;
   sqlite3_stmt* m_Stmt;  // the statement of the operation under way
+  std::vector<std::pair<std::string, sqlite3_stmt*>> m_Statements;  // prepared on m_DB, by text
+  unsigned long long m_FileId[2] = {0, 0};  // device and inode of the open database file
   unsigned int m_MetaDataLimit;
   unsigned int m_BoxArtLimit;
   unsigned int m_UserDataLimit;

@@ -4,8 +4,8 @@
 // output. Nothing here touches the network.
 //
 // The context is large (about 164 KB): allocate a Serializer with new, never on a thread's stack.
-// Callers that only store or load one record use StoreResponse and LoadResponse below, which do
-// that and the whole Begin/End sequence for them.
+// Callers that only store one record use StoreResponse below, which does that and the whole
+// Begin/End sequence for them; VLAnswerMemo reads stored records back.
 //
 // Reading needs no compression flag: the runtime recognises a gzip stream by its first byte and
 // inflates it.
@@ -85,31 +85,13 @@ int Serializer::Get(T& record) {
   return error;
 }
 
-// Stores a response record the way the cache keeps it: the gzip-compressed XML of one "DUDUVud"
-// element, in value. False (value untouched) when the runtime failed.
+// Stores a response record the way the cache keeps it: the XML of one "DUDUVud" element, gzip-
+// compressed when compress is set, in value. False (value untouched) when the runtime failed.
 template <class T>
-bool StoreResponse(const T& record, VLString& value) {
-  std::unique_ptr<Serializer> serializer(new Serializer(true, false));
+bool StoreResponse(const T& record, VLString& value, bool compress) {
+  std::unique_ptr<Serializer> serializer(new Serializer(compress, false));
   if (serializer->Put(record) != SOAP_OK) return false;
   value = serializer->GetXML();
-  return true;
-}
-
-// Loads a value made by StoreResponse (compressed or not) into record, which then looks exactly
-// as if a service call on owner had filled it: everything it points to belongs to owner's message
-// memory and is released with it. False when value is empty or is not such a record (not gzip,
-// not XML, another root element); record then holds its defaults, so a caller that finds no
-// result in it treats the value as a cache miss.
-template <class T>
-bool LoadResponse(const VLString& value, T& record, struct soap* owner) {
-  if (value.empty()) {
-    record.soap_default(owner);
-    return false;
-  }
-  std::unique_ptr<Serializer> serializer(new Serializer(false, false));
-  serializer->SetXML(value);
-  if (serializer->Get(record) != SOAP_OK) return false;
-  soap_delegate_deletion(serializer.get(), owner);
   return true;
 }
 

@@ -4,15 +4,17 @@
 // A call:
 //  1. creates the request and response records in the service object's context;
 //  2. when the operation is cached and the handle has a cache, reads the answer stored under its
-//     Name and Key back into the response record; a miss, an empty text, a text that is not such
-//     a record and a record without its result element all count as not cached;
-//  3. otherwise fills the request, runs Setup and calls the service;
-//  4. hands a present result element to the converter, which fills the caller's record and says
-//     whether the answer is worth keeping (its response code is 0, or its list is not empty);
-//  5. keeps an answer worth keeping that came from the service (not from the cache) when the
-//     handle caches that kind of data: the serialised response under Name and Key, then the
-//     operation's side data (the wishlist flags a title answer carries);
-//  6. releases everything the call allocated in the context.
+//     Name and Key and hands its result element to the converter, which fills the caller's
+//     record; the record of the stored text comes from the handle's memo of decoded answers
+//     (VLAnswerMemo), which decodes it when it has none. A miss, an empty text, a text that is
+//     not such a record and a record without its result element all count as not cached;
+//  3. otherwise fills the request, runs Setup, calls the service and hands a present result
+//     element to the converter, which also says whether the answer is worth keeping (its
+//     response code is 0, or its list is not empty);
+//  4. keeps an answer worth keeping when the handle caches that kind of data: the serialised
+//     response under Name and Key (gzip-compressed in a cache file), then the operation's side
+//     data (the wishlist flags a title answer carries); the memo takes the response record;
+//  5. releases everything the call allocated in the context.
 // It returns the SOAP error: 0 also for an answer from the cache, a missing result element and
 // a non-zero response code.
 //
@@ -35,6 +37,7 @@
 
 #include "CacheInterface.h"
 #include "Serializer.h"
+#include "VLAnswerMemo.h"
 #include "VLString.h"
 #include "VL_WS_Client.h"
 
@@ -114,21 +117,28 @@ int VLCachedCall(VL_WS_Client& client, Service& service,
   bool fromCache = false;
   if (soapError == SOAP_OK && cache != nullptr) {
     VLString value;
-    fromCache = (cache->*entry->kind.Read)(entry->name, entry->key, value) &&
-                LoadResponse(value, *response, &context) && VLResultOf(response->*op.result) != nullptr;
+    fromCache = (cache->*entry->kind.Read)(entry->name, entry->key, value) && !value.empty() &&
+                client.m_Memo->Use(entry->name, entry->key, value, op.newResponse, [&](const Response& stored) {
+                  const auto* result = VLResultOf(stored.*op.result);
+                  if (result != nullptr) convert(*result);
+                  return result != nullptr;
+                });
     if (fromCache) VLLogCacheHit(op.name);
   }
   if (soapError == SOAP_OK && !fromCache) {
     fill(*request);
     soapError = service.Setup(op.name);
     if (soapError == SOAP_OK) soapError = (service.*op.call)(request, response);
-  }
-  const auto* result = soapError == SOAP_OK ? VLResultOf(response->*op.result) : nullptr;
-  if (result != nullptr && convert(*result) && !fromCache && cache != nullptr &&
-      (client.m_Params.CacheParam.CacheData & entry->kind.Bit) != 0) {
-    VLString value;
-    if (StoreResponse(*response, value)) (cache->*entry->kind.Write)(entry->name, entry->key, value);
-    keep(*cache, *result);
+    const auto* result = soapError == SOAP_OK ? VLResultOf(response->*op.result) : nullptr;
+    if (result != nullptr && convert(*result) && cache != nullptr &&
+        (client.m_Params.CacheParam.CacheData & entry->kind.Bit) != 0) {
+      // The cache file keeps its values compressed; an in-memory cache is spared the work.
+      VLString value;
+      bool stored = StoreResponse(*response, value, client.m_Params.CacheParam.CacheType == 2 /* a file */) &&
+                    (cache->*entry->kind.Write)(entry->name, entry->key, value);
+      keep(*cache, *result);
+      if (stored) client.m_Memo->Keep(entry->name, entry->key, value, response, &context);
+    }
   }
   VLEndCall(context);
   return soapError;

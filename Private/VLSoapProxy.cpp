@@ -34,7 +34,9 @@ VLSoapProxy::~VLSoapProxy() {
 }
 
 void VLSoapProxy::Init(int imode, int omode) {
-  soap_imode(this, imode);
+  // The store's answers are document/literal and carry no id/href references: reading them as
+  // a tree skips the runtime's id table, which it would otherwise walk after every element.
+  soap_imode(this, imode | SOAP_XML_TREE);
   soap_omode(this, omode);
   soap_endpoint = NULL;
   m_LogAreaId = s_ProxyLog.Id();

@@ -48,8 +48,9 @@ class VLSoapProxy : public soap {
   // while soap_endpoint is null. Both are static texts.
   VLSoapProxy(const char* className, const char* fallbackEndpoint);
 
-  // The proxy's initialiser: sets the input and output modes, clears the endpoint, registers the
-  // "soap_proxy" area and installs the namespace table.
+  // The proxy's initialiser: sets the input and output modes (answers are read as XML trees,
+  // without id/href resolution), clears the endpoint, registers the "soap_proxy" area and
+  // installs the namespace table.
   void Init(int imode, int omode);
 
   // One operation: runs the call sequence above. logName is "<Proxy>::<operation>", requestTag

@@ -15,6 +15,7 @@
 #include <time.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <mutex>
 #include <new>
 
@@ -25,6 +26,7 @@
 
 #include "AutoSSL.h"
 #include "VLConnectTo.h"
+#include "VLTlsSessionCache.h"
 #include "VLWSAELog.h"
 #include "VL_Log.h"
 
@@ -49,47 +51,82 @@ class RawLog {
     m_Prev = 0;
   }
 
+  // Jumps from tag to tag; the bytes are copied only around a masked value, and a block without
+  // one is logged as it is.
   void Write(const char* data, size_t n) {
-    VLString text;
-    for (const char* c = data; c < data + n; m_Prev = *c++) {
-      if (m_InSecret && *c != '<') {
-        if (!m_Masked) text += kMask;
-        m_Masked = true;
-        continue;
+    VLString masked;
+    const char* kept = data;  // the first byte not yet copied into masked
+    const char* c = data;
+    const char* end = data + n;
+    while (c < end) {
+      if (m_InSecret) {
+        const char* next = Find(c, end, '<');
+        if (next > c) {  // one mask stands for the whole value
+          masked.append(kept, c - kept);
+          if (!m_Masked) masked += kMask;
+          m_Masked = true;
+          m_Prev = next[-1];
+          c = kept = next;
+          continue;
+        }
+        m_InSecret = false;
       }
-      m_InSecret = false;
-      text += *c;
+      // Within a tag, a "<" before its ">" starts another tag.
+      const char* next = m_InTag ? Find(c, Find(c, end, '>'), '<') : Find(c, end, '<');
+      if (m_InTag) {
+        size_t take = std::min(static_cast<size_t>(next - c), sizeof(m_Tag) - m_TagLength);
+        memcpy(m_Tag + m_TagLength, c, take);
+        m_TagLength += take;
+      }
+      if (next > c) m_Prev = next[-1];
+      c = next;
+      if (c == end) break;
       if (*c == '<') {
         m_InTag = true;
-        m_Tag = VLString();
-      } else if (m_InTag && *c == '>') {
+        m_TagLength = 0;
+      } else {  // the ">" that ends a tag
         m_InTag = false;
-        m_InSecret = m_Prev != '/' && IsSecretName(m_Tag);
+        m_InSecret = m_Prev != '/' && IsSecretName(m_Tag, m_TagLength);
         m_Masked = false;
-      } else if (m_InTag && m_Tag.length() < kNameLimit) {
-        m_Tag += *c;
       }
+      m_Prev = *c++;
     }
-    VL_LogOutputwithLen(*m_Area, 4, text.c_str(), static_cast<int>(text.length()));
+    if (kept == data) {
+      VL_LogOutputwithLen(*m_Area, 4, data, static_cast<int>(n));
+    } else {
+      masked.append(kept, end - kept);
+      VL_LogOutputwithLen(*m_Area, 4, masked.c_str(), static_cast<int>(masked.length()));
+    }
   }
 
  private:
   static constexpr const char* kMask = "********";
-  static const size_t kNameLimit = 64;  // more than any name looked for, prefix included
+
+  // The first byte ch in [c, end), or end.
+  static const char* Find(const char* c, const char* end, char ch) {
+    const void* found = memchr(c, ch, static_cast<size_t>(end - c));
+    return found ? static_cast<const char*>(found) : end;
+  }
+
+  static bool IsNameEnd(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '/' || c == '\0'; }
 
   // Whether the start of a tag's text (after its "<") names a secret element.
-  static bool IsSecretName(const VLString& tag) {
-    size_t length = strcspn(tag.c_str(), " \t\r\n/");
-    const char* colon = static_cast<const char*>(memrchr(tag.c_str(), ':', length));
-    const char* local = colon ? colon + 1 : tag.c_str();
-    size_t localLength = length - static_cast<size_t>(local - tag.c_str());
+  static bool IsSecretName(const char* tag, size_t tagLength) {
+    size_t length = 0;
+    while (length < tagLength && !IsNameEnd(tag[length])) ++length;
+    const char* colon = static_cast<const char*>(memrchr(tag, ':', length));
+    const char* local = colon ? colon + 1 : tag;
+    size_t localLength = length - static_cast<size_t>(local - tag);
     for (const char* secret : {"AuthToken", "password"})
       if (localLength == strlen(secret) && memcmp(local, secret, localLength) == 0) return true;
     return false;
   }
 
   const int* m_Area;  // one of the exported area ids, which are registered after construction
-  VLString m_Tag;     // the first bytes of the tag being read, after its "<"
+  // The first bytes of the tag being read, after its "<": more than any name looked for, prefix
+  // included.
+  char m_Tag[64];
+  size_t m_TagLength = 0;
   bool m_InTag = false;
   bool m_InSecret = false;  // within the value of a secret element
   bool m_Masked = false;    // the mask of that value is written
@@ -103,6 +140,8 @@ struct TransportData {
   int (*fposthdr)(soap*, const char*, const char*);
   int (*fsend)(soap*, const char*, size_t);
   const char* userAgent;
+  VLString tlsHost;  // the host and port of the open TLS connection (its session's place)
+  int tlsPort;
   long long exchangeDeadline;  // of the exchange on the open connection (see ExchangeDeadline)
   RawLog sent{&SENT_VLLogAreaID};
   RawLog received{&RECV_VLLogAreaID};
@@ -318,10 +357,15 @@ int TlsError(soap* s, SSL* ssl, const char* detail) {
   return soap_set_receiver_error(s, soap_strdup(s, text), detail, SOAP_SSL_ERROR);
 }
 
-// TLS client handshake on fd with the context's TLS context. With server authentication
-// required (the library always requires it) the chain must verify and the certificate must
-// name host.
-int StartTls(soap* s, int fd, const char* host) {
+// Only connections that check the server's certificate and host name keep and resume sessions:
+// a resumed session skips those checks, so it must come from a connection that made them.
+bool Authenticates(const soap* s) { return (s->ssl_flags & SOAP_SSL_REQUIRE_SERVER_AUTHENTICATION) != 0; }
+
+// TLS client handshake on fd with the context's TLS context, resuming the last session of
+// host:port when there is one. With server authentication required (the library always requires
+// it) the chain must verify and the certificate must name host; a resumed session was verified
+// so when it was made, for the same host and port.
+int StartTls(soap* s, int fd, const char* host, int port) {
   if (!s->ctx && s->fsslauth && (s->error = s->fsslauth(s)) != SOAP_OK) return s->error;
   if (!s->ctx) return soap_set_receiver_error(s, "SSL error", "no TLS context", SOAP_SSL_ERROR);
   ERR_clear_error();
@@ -334,7 +378,7 @@ int StartTls(soap* s, int fd, const char* host) {
   SSL_set_bio(ssl, bio, bio);
   bool ip = IsIpLiteral(host);
   if (!ip) SSL_set_tlsext_host_name(ssl, host);
-  if (s->ssl_flags & SOAP_SSL_REQUIRE_SERVER_AUTHENTICATION) {
+  if (Authenticates(s)) {
     X509_VERIFY_PARAM* param = SSL_get0_param(ssl);
     X509_VERIFY_PARAM_set_hostflags(param, X509_CHECK_FLAG_NO_PARTIAL_WILDCARDS);
     if (ip ? !X509_VERIFY_PARAM_set1_ip_asc(param, host) : !X509_VERIFY_PARAM_set1_host(param, host, 0)) {
@@ -342,22 +386,29 @@ int StartTls(soap* s, int fd, const char* host) {
       return TlsError(s, NULL, "bad host name in VLSoapTransport");
     }
     SSL_set_verify(ssl, SSL_VERIFY_PEER, SSL_CTX_get_verify_callback(s->ctx));
+    if (SSL_SESSION* session = VLTlsSessionCache::Get(host, port)) {
+      SSL_set_session(ssl, session);
+      SSL_SESSION_free(session);
+    }
   }
   long long deadline = Deadline(s, s->connect_timeout);
+  int rc = SOAP_OK;
   for (;;) {
     int r = SSL_connect(ssl);
     if (r == 1) break;
     int err = SSL_get_error(ssl, r);
     short events = err == SSL_ERROR_WANT_READ ? POLLIN : err == SSL_ERROR_WANT_WRITE ? POLLOUT : 0;
     if (!events || WaitSocket(fd, events, deadline) <= 0) {
-      int rc = TlsError(s, ssl, events ? "SSL_connect timed out" : "SSL_connect failed in VLSoapTransport");
-      SSL_free(ssl);
-      return rc;
+      rc = TlsError(s, ssl, events ? "SSL_connect timed out" : "SSL_connect failed in VLSoapTransport");
+      break;
     }
   }
-  if ((s->ssl_flags & SOAP_SSL_REQUIRE_SERVER_AUTHENTICATION) &&
-      (SSL_get_verify_result(ssl) != X509_V_OK || !SSL_get0_peer_certificate(ssl))) {
-    int rc = TlsError(s, ssl, "SSL certificate check failed in VLSoapTransport");
+  if (rc == SOAP_OK && Authenticates(s) &&
+      (SSL_get_verify_result(ssl) != X509_V_OK || !SSL_get0_peer_certificate(ssl)))
+    rc = TlsError(s, ssl, "SSL certificate check failed in VLSoapTransport");
+  if (rc != SOAP_OK) {
+    // The next handshake starts afresh, whatever went wrong with this one.
+    VLTlsSessionCache::Remove(host, port);
     SSL_free(ssl);
     return rc;
   }
@@ -376,15 +427,25 @@ SOAP_SOCKET Open(soap* s, const char* endpoint, const char* host, int port) {
   bool proxy = s->proxy_host && *s->proxy_host;
   SOAP_SOCKET fd = proxy ? ConnectTcp(s, s->proxy_host, s->proxy_port) : ConnectTcp(s, host, port);
   if (!soap_valid_socket(fd)) return SOAP_INVALID_SOCKET;
-  if (tls && ((proxy && ProxyConnect(s, fd, host, port) != SOAP_OK) || StartTls(s, fd, host) != SOAP_OK)) {
+  if (tls && ((proxy && ProxyConnect(s, fd, host, port) != SOAP_OK) || StartTls(s, fd, host, port) != SOAP_OK)) {
     close(fd);
     return SOAP_INVALID_SOCKET;
+  }
+  if (tls) {
+    d->tlsHost = host;
+    d->tlsPort = port;
   }
   return fd;
 }
 
 int Close(soap* s) {
   if (s->ssl) {
+    // The answer has been read, and with it the session tickets that TLS 1.3 sends after the
+    // handshake: the session to resume next time.
+    if (Authenticates(s) && SSL_is_init_finished(s->ssl)) {
+      TransportData* d = Data(s);
+      VLTlsSessionCache::Put(d->tlsHost.c_str(), d->tlsPort, SSL_get0_session(s->ssl));
+    }
     // Say goodbye without waiting for the peer's answer: the message is complete or failed.
     if (SSL_is_init_finished(s->ssl) && !(SSL_get_shutdown(s->ssl) & SSL_SENT_SHUTDOWN))
       SSL_shutdown(s->ssl);
@@ -472,6 +533,7 @@ int Plugin(soap* s, soap_plugin* p, void*) {
   d->fposthdr = s->fposthdr;
   d->fsend = s->fsend;
   d->userAgent = NULL;
+  d->tlsPort = 0;
   d->exchangeDeadline = -1;
   p->id = kPluginId;
   p->data = d;

@@ -5,7 +5,8 @@
 //   override VLWS_CONNECT_TO (VLConnectTo); connect time-out = the context's connect_timeout.
 //   For "https" URLs then a CONNECT tunnel through the proxy, and TLS with the context's TLS
 //   context: SNI and the certificate check use the URL's host, never the overridden address.
-//   The handshake is bounded by connect_timeout as well.
+//   The handshake is bounded by connect_timeout as well. It resumes the last TLS session of the
+//   same host and port (VLTlsSessionCache), which the close keeps once the answer is read.
 // - TLS writes go through a socket BIO that sends with MSG_NOSIGNAL, so a peer that hangs up
 //   gives an error result and never a SIGPIPE (plain sockets get the same flag through the
 //   context's socket_flags, set by the service objects).

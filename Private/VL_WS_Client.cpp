@@ -201,6 +201,7 @@ extern "C" VL_WS_Status VL_WS_initialize(VL_WS_Handle* handle, const VL_WS_Setup
   if (in.CacheType == kNoCache) return VL_WS_OK;
   client->m_Cache = OpenCache(p.CacheParam, true);
   if (client->m_Cache == 0) return Fail(handle, VL_WS_E_CACHE_OPEN);
+  client->m_Memo = std::make_shared<VLAnswerMemo>();
   VL_WS_updateLocalCache(handle, VL_WS_CacheParam::CACHE_METADATA | VL_WS_CacheParam::CACHE_USERDATA);
   return VL_WS_OK;
 }
@@ -219,6 +220,7 @@ extern "C" VL_WS_Status VL_WS_duplicate(VL_WS_Handle* copy, const VL_WS_Handle* 
   if (client->m_Params.CacheParam.CacheType == kFileCache) {
     client->m_Cache = OpenCache(client->m_Params.CacheParam, false);
     if (client->m_Cache == 0) return VL_WS_E_CACHE_OPEN;
+    client->m_Memo = from->m_Memo;
   }
   return VL_WS_OK;
 }

@@ -1,16 +1,19 @@
-// VL_WS_Client.h: the client state behind a VL_WS_Handle (tag 1). One block per handle, never
-// shared: its three SOAP service objects, the dispatcher of account operations, the handle's
-// own settings and its cache. Also the steps that the client operations share: tag the
+// VL_WS_Client.h: the client state behind a VL_WS_Handle (tag 1). One block per handle: its
+// three SOAP service objects, the dispatcher of account operations, the handle's own settings and
+// its cache, whose decoded answers it shares with its duplicates. Also the steps that the client operations share: tag the
 // out-record and find the client (VLClientFor) and end a SOAP call (VLEndCall); the call itself
 // is VLCachedCall.h's.
 #ifndef VL_WS_CLIENT_H
 #define VL_WS_CLIENT_H
+
+#include <memory>
 
 #include "CacheInterface.h"
 #include "DownloadAPI.h"
 #include "RealTimeBrowse.h"
 #include "StreamAPI.h"
 #include "StreamDownloadAPI.h"
+#include "VLAnswerMemo.h"
 #include "VLRecord.h"
 #include "VL_WS_SetupParams2.h"
 #include "VL_WS_Types.h"
@@ -22,6 +25,8 @@ struct VL_WS_Client {
   StreamDownloadAPI m_StreamDownloadAPI;  // routes account operations by access type
   VL_WS_SetupParams2 m_Params;            // the handle's settings; the services point at them
   CacheInterface* m_Cache = nullptr;      // null when the handle has no cache
+  // The decoded answers of the cache, shared with the handle's duplicates; null without a cache.
+  std::shared_ptr<VLAnswerMemo> m_Memo;
 };
 
 // The client state of a handle: null for a null handle and for a handle without client state,

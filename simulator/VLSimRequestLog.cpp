@@ -32,6 +32,7 @@ std::string VLSimRequestLog::Format(const VLSimRequest& r) {
             r.settingsElement + " key=" + r.apiKey + " token=" + (r.hasAuthToken ? r.authToken : "(none)") +
             " user=" + r.userName + " auth=" + r.authentication + " id=" + r.messageID + "]";
   }
+  if (r.resumed) line += " (TLS session resumed)";
   if (!r.faults.empty()) line += " faults: " + r.faults;
   if (!r.note.empty()) line += " (" + r.note + ")";
   return line;

@@ -11,6 +11,7 @@
 struct VLSimRequest {
   int connection = 0;     // serial number of the connection, from 1
   bool tls = false;
+  bool resumed = false;    // the TLS session was resumed from a ticket
   std::string serverName;  // TLS SNI, or ""
   std::string host;        // Host header without port
   std::string method;

@@ -87,7 +87,9 @@ struct VLSimServer::Impl {
   void AcceptLoop(int which);
   void Serve(int fd, bool tls, int number);
   void ReapWorkers(bool all);
-  static int ServerNameCallback(SSL* ssl, int* alert, void* arg);
+  static int ClientHelloCallback(SSL* ssl, int* alert, void* arg);
+  static SSL_TICKET_RETURN TicketCallback(SSL* ssl, SSL_SESSION* session, const unsigned char* keyName,
+                                          size_t keyNameLength, SSL_TICKET_STATUS status, void* arg);
 };
 
 VLSimServer::VLSimServer(const VLSimOptions& options) : m_Impl(new Impl) {
@@ -126,15 +128,51 @@ bool VLSimServer::Impl::Listen(int which, int port, std::string* error) {
   return true;
 }
 
-int VLSimServer::Impl::ServerNameCallback(SSL* ssl, int*, void* arg) {
+namespace {
+
+// The host name of the ClientHello's server_name extension, or "".
+std::string ClientHelloServerName(SSL* ssl) {
+  const unsigned char* p = nullptr;
+  size_t length = 0;
+  // A list of (type, 2-byte length, name) behind its own 2-byte length; clients send one name.
+  if (!SSL_client_hello_get0_ext(ssl, TLSEXT_TYPE_server_name, &p, &length) || length < 5 ||
+      p[2] != TLSEXT_NAMETYPE_host_name)
+    return "";
+  size_t nameLength = static_cast<size_t>(p[3]) << 8 | p[4];
+  return nameLength <= length - 5 ? std::string(reinterpret_cast<const char*>(p) + 5, nameLength) : "";
+}
+
+}  // namespace
+
+// A TLS fault is taken as the ClientHello arrives, before a session ticket in it is looked at:
+// the connection then presents the fault's certificate.
+int VLSimServer::Impl::ClientHelloCallback(SSL* ssl, int*, void* arg) {
   Impl* impl = static_cast<Impl*>(arg);
-  const char* name = SSL_get_servername(ssl, TLSEXT_NAMETYPE_host_name);
   VLSimFault fault;
-  if (impl->context.faults.TakeTls(name ? name : "", &fault)) {
+  if (impl->context.faults.TakeTls(ClientHelloServerName(ssl), &fault)) {
     SSL_set_SSL_CTX(ssl, impl->tlsContexts[VLSimCertificates::Parse(fault.text)]);
     SSL_set_app_data(ssl, const_cast<char*>(VLSimCertificates::Name(VLSimCertificates::Parse(fault.text))));
   }
-  return SSL_TLSEXT_ERR_OK;
+  return SSL_CLIENT_HELLO_SUCCESS;
+}
+
+// Sessions are resumed from the tickets the server issues (OpenSSL's defaults), except on a
+// connection with a TLS fault: resumed, it would send no certificate at all, and a client must
+// see the fault's certificate to refuse it.
+SSL_TICKET_RETURN VLSimServer::Impl::TicketCallback(SSL* ssl, SSL_SESSION*, const unsigned char*, size_t,
+                                                    SSL_TICKET_STATUS status, void*) {
+  if (SSL_get_app_data(ssl)) return SSL_TICKET_RETURN_IGNORE;
+  switch (status) {
+    case SSL_TICKET_SUCCESS:
+      return SSL_TICKET_RETURN_USE;
+    case SSL_TICKET_SUCCESS_RENEW:
+      return SSL_TICKET_RETURN_USE_RENEW;
+    case SSL_TICKET_FATAL_ERR_MALLOC:
+    case SSL_TICKET_FATAL_ERR_OTHER:
+      return SSL_TICKET_RETURN_ABORT;
+    default:  // no ticket, an empty one, or one that does not decrypt
+      return SSL_TICKET_RETURN_IGNORE_RENEW;
+  }
 }
 
 bool VLSimServer::Impl::MakeTlsContexts(std::string* error) {
@@ -149,8 +187,8 @@ bool VLSimServer::Impl::MakeTlsContexts(std::string* error) {
       ERR_clear_error();
       return false;
     }
-    SSL_CTX_set_tlsext_servername_callback(ctx, ServerNameCallback);
-    SSL_CTX_set_tlsext_servername_arg(ctx, this);
+    SSL_CTX_set_client_hello_cb(ctx, ClientHelloCallback, this);
+    SSL_CTX_set_session_ticket_cb(ctx, nullptr, TicketCallback, nullptr);
   }
   return true;
 }
@@ -293,6 +331,7 @@ void VLSimServer::Impl::Serve(int fd, bool tls, int number) {
       entry.serverName = connection.ServerName();
       const char* certificate = ssl ? static_cast<const char*>(SSL_get_app_data(ssl)) : nullptr;
       if (certificate) entry.faults = "tls:" + std::string(certificate);
+      entry.resumed = ready && SSL_session_reused(ssl);
       ERR_clear_error();
     }
     VLSimHttpRequest request;

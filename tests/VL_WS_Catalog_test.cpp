@@ -274,7 +274,7 @@ TEST_F(Catalog, UnreadableCachedAnswerIsAMissAndIsReplaced) {
   // Not a stored record at all, and a stored response without its result element.
   _VL1__getTitlesByNavigationResponse empty;
   VLString noResult;
-  ASSERT_TRUE(StoreResponse(empty, noResult));
+  ASSERT_TRUE(StoreResponse(empty, noResult, true));
   for (const VLString& text : {VLString("not gzip, not XML"), noResult}) {
     ASSERT_TRUE(Cache().WriteMetaData("getTitles", "1,1,5,2", text));
     VL_WS_TitlesResponse page;

@@ -587,6 +587,37 @@ TEST_F(Client, ALiveHandleIsNeverMadeAnew) {
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
 }
 
+// Every call has its own connection; all but the first to a host resume the TLS session of the
+// one before, across handles. A server that presents a wrong certificate is refused all the same.
+TEST_F(Client, TlsSessionsAreResumedAndTheCertificateIsStillChecked) {
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams()));
+  VL_WS_Handle duplicate = {};
+  ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&duplicate, &m_Handle));
+  auto label = [](VL_WS_Handle* handle) {
+    VL_WS_GenreLabelResponse response;
+    VL_WS_Status status = VL_WS_getGenreLabel(handle, 12, &response);
+    VL_WS_release(&response);
+    return status;
+  };
+  ASSERT_EQ(VL_WS_OK, label(&m_Handle));
+  ASSERT_EQ(VL_WS_OK, label(&duplicate));
+  std::vector<VLSimRequest> log = Requests(2);
+  ASSERT_EQ(2u, log.size());
+  EXPECT_TRUE(log[1].resumed);
+
+  Fault("store.ostrel.example=tls:wronghost,times=1");
+  EXPECT_EQ(VL_WS_E_TLS, label(&m_Handle));
+  ASSERT_EQ(VL_WS_OK, label(&m_Handle));
+  ASSERT_EQ(VL_WS_OK, label(&duplicate));
+  log = Requests(5);
+  ASSERT_EQ(5u, log.size());
+  EXPECT_EQ("tls:wronghost", log[2].faults);
+  EXPECT_EQ("TLS handshake failed", log[2].note);
+  EXPECT_FALSE(log[3].resumed) << "a failed handshake forgets the session";
+  EXPECT_TRUE(log[4].resumed);
+  VL_WS_release(&duplicate);
+}
+
 TEST(ClientInterface, VersionAndEnvironmentList) {
   VL_WS_Version version;
   ASSERT_EQ(VL_WS_OK, VL_WS_getVersion(&version));
