@@ -21,6 +21,19 @@ VLSimServer& VLTestSimulator();
 // question to the store), no cache and no proxy. The strings are static.
 VL_WS_SetupParams VLTestSetupParams();
 
+// Calls operation with the arguments and a record of its own, checks that the record carries a
+// tag (the given one, unless that is VL_WS_TAG_NONE) and that it is released; returns the
+// operation's status.
+template <class Record, class... Params, class... Args>
+VL_WS_Status VLReleasedCall(int tag, VL_WS_Status (*operation)(VL_WS_Handle*, Params...), VL_WS_Handle* handle,
+                            Args... args) {
+  Record record;
+  VL_WS_Status status = operation(handle, args..., &record);
+  EXPECT_TRUE(record.tag != nullptr && (tag == VL_WS_TAG_NONE || *record.tag == tag));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&record));
+  return status;
+}
+
 // A test on the program's simulator with one client handle: it starts without faults and with an
 // empty request log, and its handle is released at its end.
 class VLSimClientTest : public testing::Test {
