@@ -10,11 +10,12 @@
 #include "VLSimServer.h"
 #include "VL_WS.h"
 
-// The program's simulator, started on ephemeral ports at the first call, with SSL_CERT_FILE and
-// VLWS_CONNECT_TO pointing at it. The library reads VLWS_CONNECT_TO at its first connection and
-// never again, so a program has this one simulator for all its tests: call it before any client
-// connects. Tests that change the simulator's faults or store should undo what they change.
-VLSimServer& VLTestSimulator();
+// The program's simulator, started on ephemeral ports at the first call (with the options of
+// that call), with SSL_CERT_FILE and VLWS_CONNECT_TO pointing at it. The library reads
+// VLWS_CONNECT_TO at its first connection and never again, so a program has this one simulator
+// for all its tests: call it before any client connects. Tests that change the simulator's
+// faults or store should undo what they change.
+VLSimServer& VLTestSimulator(const VLSimOptions& options = VLSimOptions());
 
 // A setup record the simulator accepts: its user, password and API key, device
 // "00-11-22-33-44-55" of type 7, the general catalogue in production, access type STREAM (no
