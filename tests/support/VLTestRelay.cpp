@@ -46,7 +46,7 @@ int ListenOn(int port) {
 
 // One relayed connection: what each side has still to say.
 struct Link {
-  int fd[2];               // the client's side, the target's side
+  int fd[2];                    // the client's side, the target's side
   bool open[2] = {true, true};  // that side has not ended what it sends
 };
 
@@ -62,30 +62,36 @@ void End(Link& link, bool reset) {
   link.open[0] = link.open[1] = false;
 }
 
-// Passes what side `from` sent to the other side. False when the link has ended.
-bool Pass(Link& link, int from) {
+// Passes what side `from` sent on to the other side; its end, too.
+void Pass(Link& link, int from) {
   char buffer[16384];
   ssize_t n = recv(link.fd[from], buffer, sizeof buffer, 0);
-  if (n < 0) {
-    End(link, true);
-    return false;
-  }
+  if (n < 0) return End(link, true);
   if (n == 0) {
     link.open[from] = false;
     shutdown(link.fd[1 - from], SHUT_WR);
-    if (link.open[1 - from]) return true;
-    End(link, false);
-    return false;
+    if (!link.open[1 - from]) End(link, false);
+    return;
   }
   for (ssize_t sent = 0; sent < n;) {
     ssize_t m = send(link.fd[1 - from], buffer + sent, static_cast<size_t>(n - sent), MSG_NOSIGNAL);
-    if (m <= 0) {
-      End(link, true);
-      return false;
-    }
+    if (m <= 0) return End(link, true);  // the peer is gone, or has read nothing for 5 s
     sent += m;
   }
-  return true;
+}
+
+// A link between a new client and the target; the sides' sends wait 5 s at most.
+void Connect(std::vector<Link>* links, int client, int targetPort) {
+  int target = socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
+  sockaddr_in address = Loopback(targetPort);
+  if (target < 0 || connect(target, reinterpret_cast<sockaddr*>(&address), sizeof address) != 0) {
+    if (target >= 0) close(target);
+    close(client);
+    return;
+  }
+  timeval wait = {5, 0};
+  for (int fd : {client, target}) setsockopt(fd, SOL_SOCKET, SO_SNDTIMEO, &wait, sizeof wait);
+  links->push_back({{client, target}});
 }
 
 }  // namespace
@@ -136,20 +142,15 @@ void VLTestRelay::Run() {
           sides.push_back({k, side});
         }
     if (poll(waits.data(), waits.size(), -1) < 0) continue;
-    for (size_t k = 0; k < sides.size(); ++k)
-      if (waits[2 + k].revents) Pass(links[sides[k].first], sides[k].second);
+    for (size_t k = 0; k < sides.size(); ++k) {
+      Link& link = links[sides[k].first];  // which the other side's pass may have ended
+      if (waits[2 + k].revents && link.open[sides[k].second]) Pass(link, sides[k].second);
+    }
     links.erase(std::remove_if(links.begin(), links.end(), [](const Link& l) { return !l.open[0] && !l.open[1]; }),
                 links.end());
     if (m_Listen >= 0 && (waits[1].revents & POLLIN)) {
       int client = accept4(m_Listen, nullptr, nullptr, SOCK_CLOEXEC);
-      int target = socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
-      sockaddr_in address = Loopback(m_Target);
-      if (client >= 0 && target >= 0 && connect(target, reinterpret_cast<sockaddr*>(&address), sizeof address) == 0) {
-        links.push_back({{client, target}});
-      } else {
-        if (client >= 0) close(client);
-        if (target >= 0) close(target);
-      }
+      if (client >= 0) Connect(&links, client, m_Target);
     }
     char order;
     if (waits[0].revents && read(m_Orders[0], &order, 1) == 1) {
