@@ -18,7 +18,9 @@
 #include <vector>
 
 #if defined(__SANITIZE_ADDRESS__)
-#include <sanitizer/allocator_interface.h>
+// AddressSanitizer's count of the bytes in use (its allocator replaces glibc's; g++ ships no
+// header that declares it).
+extern "C" size_t __sanitizer_get_current_allocated_bytes();
 #endif
 
 #include "VLTestDir.h"
