@@ -34,7 +34,11 @@ VLSoapProxy::~VLSoapProxy() {
 }
 
 void VLSoapProxy::Init(int imode, int omode) {
-  soap_imode(this, imode);
+  // The store's answers are document/literal: no element stands for another by "id" and "href"
+  // (SOAP encoding's multi-references), so they are read as plain trees. Otherwise the runtime
+  // would keep a table of every "id" an answer shows, and for one shown twice it copies the id's
+  // text onto itself (undefined behaviour: the copy overlaps its source).
+  soap_imode(this, imode | SOAP_XML_TREE);
   soap_omode(this, omode);
   soap_endpoint = NULL;
   m_LogAreaId = s_ProxyLog.Id();
