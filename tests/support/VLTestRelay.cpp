@@ -14,7 +14,8 @@
 
 namespace {
 
-// The lowest port the system gives outgoing connections (32768 when it cannot be read).
+// The lowest port the system gives outgoing connections (32768 when it cannot be read), at least
+// 11000, so that the relay has a thousand ports from 10000 up to choose from.
 int EphemeralLow() {
   int low = 32768, high = 0;
   FILE* range = fopen("/proc/sys/net/ipv4/ip_local_port_range", "r");
@@ -22,7 +23,7 @@ int EphemeralLow() {
     if (fscanf(range, "%d %d", &low, &high) != 2) low = 32768;
     fclose(range);
   }
-  return low;
+  return std::max(low, 11000);
 }
 
 sockaddr_in Loopback(int port) {

@@ -31,12 +31,12 @@ class VLTestRelay {
 
   const int m_Target;
   int m_Port = 0;
-  int m_Listen = -1;          // -1 while refusing; the thread's
+  int m_Listen = -1;           // the listening socket, -1 while refusing; the thread's
   int m_Orders[2] = {-1, -1};  // a pipe to the thread
   std::mutex m_Mutex;
   std::condition_variable m_Done;
-  int m_Carried = 0;  // orders carried out, under m_Mutex
-  bool m_Listening = true;     // under m_Mutex
+  int m_Carried = 0;        // orders carried out, under m_Mutex
+  bool m_Listening = true;  // under m_Mutex
   std::thread m_Thread;
 };
 
