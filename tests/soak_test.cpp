@@ -2,10 +2,9 @@
 // run a few thousand mixed operations (catalogue pages and details, account answers kept as user
 // data, wishlist changes, THX settings of the streaming service, box art, the environment query,
 // the server time, cache refreshes) while the store answers about a third of the requests with a
-// random fault.
-// Every call must end with a status of the interface and a record that can be released, the
-// cache file must stay sound, and the heap in use must not grow from the first half of the run
-// to the second. The operations and faults of each thread come from a fixed seed.
+// random fault. Every call must end with a status of the interface and a record that can be
+// released, the cache file must stay sound, and the heap in use must not grow from the first half
+// of the run to the second. The operations and faults of each thread come from a fixed seed.
 #include <gtest/gtest.h>
 
 #include <malloc.h>
