@@ -34,8 +34,10 @@ VLSoapProxy::~VLSoapProxy() {
 }
 
 void VLSoapProxy::Init(int imode, int omode) {
-  // The store's answers are document/literal and carry no id/href references: reading them as
-  // a tree skips the runtime's id table, which it would otherwise walk after every element.
+  // The store's answers are document/literal: no element stands for another by "id" and "href"
+  // (SOAP encoding's multi-references), so they are read as plain trees. Otherwise the runtime
+  // would keep a table of every "id" an answer shows, and for one shown twice it copies the id's
+  // text onto itself (undefined behaviour: the copy overlaps its source).
   soap_imode(this, imode | SOAP_XML_TREE);
   soap_omode(this, omode);
   soap_endpoint = NULL;

@@ -3,7 +3,6 @@
 #include "CacheMgr.h"
 
 #include <gtest/gtest.h>
-#include <sqlite3.h>
 
 #include <string>
 #include <thread>
@@ -78,22 +77,6 @@ void ExpectOnlyKinds(CacheMgr& cache, int data) {
     EXPECT_FALSE(cache.RemoveWishlistFlag(1));
     EXPECT_FALSE(cache.RemoveAllWishlistFlags());
   }
-}
-
-// Runs statements on a cache file from outside, as another program would; the first column of
-// the first row they give, as text.
-std::string RunOnFile(const std::string& path, const std::string& sql) {
-  sqlite3* db = nullptr;
-  std::string first;
-  EXPECT_EQ(SQLITE_OK, sqlite3_open(path.c_str(), &db));
-  auto keepFirst = [](void* out, int, char** values, char**) {
-    std::string& text = *static_cast<std::string*>(out);
-    if (text.empty() && values[0]) text = values[0];
-    return 0;
-  };
-  EXPECT_EQ(SQLITE_OK, sqlite3_exec(db, sql.c_str(), keepFirst, &first, nullptr)) << sql;
-  sqlite3_close(db);
-  return first;
 }
 
 // Box art gets 70%, the others 15% each; the rounding rest goes to box art, else to user data,
@@ -369,7 +352,7 @@ TEST(CacheTypes, FileCacheIsSharedAndHoldsNoConnectionBetweenOperations) {
   ASSERT_TRUE(file.a.WriteMetaData("n", "k", "v"));
   EXPECT_TRUE(HasMeta(file.b, "n", "k"));
   // Another program can take the write lock while both caches are open.
-  RunOnFile(file.path, "BEGIN EXCLUSIVE; DELETE FROM Service; COMMIT;");
+  VLRunSql(file.path, "BEGIN EXCLUSIVE; DELETE FROM Service; COMMIT;");
   EXPECT_FALSE(HasMeta(file.a, "n", "k"));
 }
 
@@ -393,15 +376,15 @@ TEST(CacheTypes, DamagedDatabaseIsMadeAnewByTheOperationThatFindsIt) {
   const std::string& path = file.path;
   const std::string value(500, 'v');
   for (int i = 0; i < 30; ++i) ASSERT_TRUE(cache.WriteMetaData("n", std::to_string(i).c_str(), value.c_str()));
-  long pageSize = std::stol(RunOnFile(path, "PRAGMA page_size"));
-  long root = std::stol(RunOnFile(path, "SELECT rootpage FROM sqlite_master WHERE name = 'Service'"));
+  long pageSize = std::stol(VLRunSql(path, "PRAGMA page_size"));
+  long root = std::stol(VLRunSql(path, "SELECT rootpage FROM sqlite_master WHERE name = 'Service'"));
   std::string bytes = VLReadFile(path);
   ASSERT_GT(root, 1);
   bytes.replace((root - 1) * pageSize, pageSize, pageSize, '\xA5');
   ASSERT_TRUE(VLWriteFile(path, bytes));
 
   EXPECT_FALSE(HasMeta(cache, "n", "7"));
-  EXPECT_EQ("ok", RunOnFile(path, "PRAGMA integrity_check"));
+  EXPECT_EQ("ok", VLRunSql(path, "PRAGMA integrity_check"));
   EXPECT_FALSE(HasMeta(other, "n", "8"));
   ASSERT_TRUE(other.WriteMetaData("n", "k", "v"));
   EXPECT_TRUE(HasMeta(cache, "n", "k"));
@@ -455,9 +438,9 @@ TEST(BoxArtEviction, RemovesEverySizeOfTheOldestTitlesWithTheirFiles) {
   }
   ASSERT_TRUE(cache.WriteBoxArt("t0", VL_WS_BOXART_135S, 10, "", 0, ""));
   ASSERT_TRUE(VLWriteFile(dir / "t0135.jpg", "img"));
-  RunOnFile(path,
-            "UPDATE BoxArt SET TS = datetime('2011-01-01', '+' || substr(Prefix, 2) || ' minutes');"
-            "UPDATE BoxArt SET TS = '2012-01-01 00:00:00' WHERE Dim = 6;");
+  VLRunSql(path,
+           "UPDATE BoxArt SET TS = datetime('2011-01-01', '+' || substr(Prefix, 2) || ' minutes');"
+           "UPDATE BoxArt SET TS = '2012-01-01 00:00:00' WHERE Dim = 6;");
 
   // 11 * 90 + 10 = 1000: not above the budget, so this write evicts nothing.
   ASSERT_TRUE(cache.WriteBoxArt("new", VL_WS_BOXART_95, 5, "", 0, ""));

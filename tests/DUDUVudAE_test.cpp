@@ -98,6 +98,13 @@ TEST(DUDUVudAEMovie, ImmediateCodesSynchronousMethodsFailuresAndDroppedObjects) 
   EXPECT_EQ(std::string::npos, output.find("FLASH TRACE == two")) << output;
 }
 
+TEST(DUDUVudAEMovie, EachFaultCompletesWithItsStatusAndTheNextRequestIsAnswered) {
+  PlayMovie("faults.js", {"store.ostrel.example=tls:wronghost,times=1", "getTitlesByNavigation=status:503,times=1",
+                          "authorizeDevice=cut,times=1", "getEmailAddress=close,times=1",
+                          "showPrePaidCardBalance=soapfault,times=1", "getBonusAssetLocation=code:5,times=1",
+                          "/speedtest/=status:404,times=1"});
+}
+
 TEST(DUDUVudAEMovie, ThreeHundredRequestsCachedAndUncached) { PlayMovie("many.js"); }
 
 TEST(DUDUVudAEMovie, EnvListNamesADefaultOutsideTheListByItsNumber) {

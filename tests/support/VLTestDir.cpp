@@ -4,6 +4,7 @@
 #include <ftw.h>
 #include <gtest/gtest.h>
 #include <limits.h>
+#include <sqlite3.h>
 #include <stdlib.h>
 #include <unistd.h>
 
@@ -64,4 +65,25 @@ std::set<std::string> VLFolderFiles(const std::string& folder) {
   }
   if (dir) closedir(dir);
   return names;
+}
+
+std::string VLCacheFileIn(const std::string& folder) {
+  for (const std::string& name : VLFolderFiles(folder))
+    if (name.size() > 3 && name.compare(name.size() - 3, 3, ".vl") == 0) return folder + name;
+  return std::string();
+}
+
+std::string VLRunSql(const std::string& path, const std::string& sql) {
+  sqlite3* db = nullptr;
+  std::string rows;
+  EXPECT_EQ(SQLITE_OK, sqlite3_open(path.c_str(), &db)) << path;
+  auto append = [](void* out, int columns, char** values, char**) {
+    std::string& text = *static_cast<std::string*>(out);
+    if (!text.empty()) text += "\n";
+    for (int c = 0; c < columns; ++c) text += std::string(c ? "|" : "") + (values[c] ? values[c] : "");
+    return 0;
+  };
+  EXPECT_EQ(SQLITE_OK, sqlite3_exec(db, sql.c_str(), append, &rows, nullptr)) << sql;
+  sqlite3_close(db);
+  return rows;
 }

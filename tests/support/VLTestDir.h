@@ -1,5 +1,5 @@
-// Test helpers for files: a fresh temporary directory per test, and a scoped change of the
-// current directory.
+// Test helpers for files: a fresh temporary directory per test, a scoped change of the current
+// directory, whole files, and SQL on a cache file from outside.
 #ifndef VLTESTDIR_H
 #define VLTESTDIR_H
 
@@ -42,5 +42,12 @@ std::set<std::string> VLFolderFiles(const std::string& folder);
 std::string VLReadFile(const std::string& path);
 // Writes content to path (created or truncated); false on failure.
 bool VLWriteFile(const std::string& path, const std::string& content);
+
+// The cache database in a folder: the file whose name ends in ".vl" ("" when there is none).
+std::string VLCacheFileIn(const std::string& folder);
+
+// Runs statements on an SQLite file from outside, as another program would. The rows they give,
+// columns separated by "|" (a null as ""), rows by a line end after all but the last.
+std::string VLRunSql(const std::string& path, const std::string& sql);
 
 #endif  // VLTESTDIR_H

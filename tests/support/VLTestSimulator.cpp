@@ -6,9 +6,9 @@
 #include <memory>
 #include <string>
 
-VLSimServer& VLTestSimulator() {
-  static std::unique_ptr<VLSimServer> s_Sim = [] {
-    std::unique_ptr<VLSimServer> sim(new VLSimServer());
+VLSimServer& VLTestSimulator(const VLSimOptions& options) {
+  static std::unique_ptr<VLSimServer> s_Sim = [&options] {
+    std::unique_ptr<VLSimServer> sim(new VLSimServer(options));
     std::string error;
     if (!sim->Start(&error)) {
       fprintf(stderr, "the store simulator does not start: %s\n", error.c_str());
