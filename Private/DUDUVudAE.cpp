@@ -35,9 +35,6 @@ const int kQueryFailed = -5;
 
 const char kClassName[] = "DUDUVudAE";
 
-// CacheType of a cache file, the only one that prefetching works with.
-const int kCacheFile = 2;
-
 using ae::stagecraft::ASObject;
 using ae::stagecraft::ASValue;
 using ae::stagecraft::ASValueArray;
@@ -709,6 +706,14 @@ void DUDUVudAE::RunThread(const char* name, void (*worker)(void*), Param* record
   m_Lock->Unlock();
 }
 
+VLThread* DUDUVudAE::TakeThread() {
+  m_Lock->Lock();
+  VLThread* thread = m_Thread;
+  m_Thread = nullptr;
+  m_Lock->Unlock();
+  return thread;
+}
+
 void DUDUVudAE::SafeDestroyThread(VLThread*& slot) {
   if (!slot) return;
   slot->WaitUntilCompletion();
@@ -772,10 +777,7 @@ void DUDUVudAE::OnUpdate(StageWindow*, ASObject& object) {
   ASObject callback = m_Callback;
   m_Callback.Release();
   if (!callback.IsValid()) {
-    m_Lock->Lock();
-    VLThread* thread = m_Thread;
-    m_Thread = nullptr;
-    m_Lock->Unlock();
+    VLThread* thread = TakeThread();
     SafeDestroyThread(thread);
     DiscardResult();
     return;
@@ -784,10 +786,7 @@ void DUDUVudAE::OnUpdate(StageWindow*, ASObject& object) {
   ASValue value;
   DUDUVud::SetResult(m_Result, value, callback);
   m_Result.type = RESULT_NONE;
-  m_Lock->Lock();
-  VLThread* thread = m_Thread;
-  m_Thread = nullptr;  // from here on a new request is accepted, from onComplete too
-  m_Lock->Unlock();
+  VLThread* thread = TakeThread();  // from here on a new request is accepted, from onComplete too
   ASValue status;
   status.SetInteger(m_Result.status);
   callback.CallMethod("onComplete", status, value);

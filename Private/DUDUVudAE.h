@@ -207,6 +207,8 @@ class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
   // Starts the worker thread in the worker slot and asks for updates; when no thread can be
   // started, the request completes with VL_WS_E_UNEXPECTED instead.
   void RunThread(const char* name, void (*worker)(void*), Param* record, ASObject& object);
+  // Takes the worker thread out of its slot, under the main lock.
+  VLThread* TakeThread();
   // Waits for the thread in slot to end, then destroys it and clears the slot.
   void SafeDestroyThread(VLThread*& slot);
   // After a page result: counts the page and starts fetching its neighbours.
@@ -224,6 +226,9 @@ class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
   void PrepareResult(Result_Type type);
   // Releases the out-record of a result that will not be delivered.
   void DiscardResult();
+
+  // The CacheType of a cache file, the only one that prefetching works with.
+  static const int kCacheFile = 2;
 
   Result m_Result;
   VL_WS_Handle m_Client;

@@ -22,9 +22,6 @@ const unsigned kPagesWanted = 8;
 // The waiting box-art list grows to a little over this size, the newest prefixes first.
 const size_t kMaxWaitingBoxArts = 50;
 
-// The CacheType of a cache file and the selection bits of CacheData.
-const int kCacheFile = 2;
-
 // Holds a kernel mutex for a scope.
 class Locked {
  public:
