@@ -22,9 +22,7 @@ void VLServiceBinding::Bind(VLSoapProxy* proxy, const VL_WS_SetupParams2& params
     proxy->proxy_http_version = "1.1";
   }
   VLSoapTransport::SetUserAgent(proxy, params.UserAgent.c_str());
-  proxy->send_timeout = params.SendTimeout;
-  proxy->connect_timeout = params.SendTimeout;
-  proxy->recv_timeout = params.RecvTimeout;
+  VLSoapTransport::SetTimeouts(proxy, params.SendTimeout, params.RecvTimeout);
   proxy->soap_endpoint = endpoint->c_str();
   soap_register_plugin(proxy, soap_wsa);
   soap_register_plugin(proxy, soap_wsse);

@@ -2,8 +2,6 @@
 
 #include <string.h>
 
-#include <sys/socket.h>
-
 #include "VLSoapTransport.h"
 #include "VLWSAELog.h"
 
@@ -19,12 +17,7 @@ VLSoapProxy::VLSoapProxy(const char* className, const char* fallbackEndpoint)
       m_ClassName(className),
       m_FallbackEndpoint(fallbackEndpoint),
       m_LogAreaId(-1) {
-  // Connection settings of every service context; the handle's settings may change the
-  // time-outs later.
-  send_timeout = 30;
-  connect_timeout = 30;  // also bounds the TLS handshake
-  recv_timeout = 88;
-  socket_flags = MSG_NOSIGNAL;
+  // The handle's settings may change the time-outs later.
   VLSoapTransport::Install(this);
 }
 

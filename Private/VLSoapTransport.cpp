@@ -29,10 +29,15 @@
 #include "VLTlsSessionCache.h"
 #include "VLWSAELog.h"
 #include "VL_Log.h"
+#include "VL_WS_SetupParams2.h"
 
 namespace {
 
 const char kPluginId[] = "VL-Transport-1.0";
+
+// Every send of the library, plain or TLS: a peer that hangs up gives an error result, never a
+// SIGPIPE that would end the launcher.
+const int kNoSignal = MSG_NOSIGNAL;
 
 // ---- Raw logs --------------------------------------------------------------------------------
 
@@ -142,6 +147,7 @@ struct TransportData {
   const char* userAgent;
   VLString tlsHost;  // the host and port of the open TLS connection (its session's place)
   int tlsPort;
+  int family;  // of the next connection's addresses; AF_UNSPEC any
   long long exchangeDeadline;  // of the exchange on the open connection (see ExchangeDeadline)
   RawLog sent{&SENT_VLLogAreaID};
   RawLog received{&RECV_VLLogAreaID};
@@ -223,10 +229,11 @@ int ConnectOne(const addrinfo* ai, long long deadline, int* err) {
   return -1;
 }
 
-// Connects to host:port, or where VLWS_CONNECT_TO sends it. The socket stays non-blocking when
-// the context has send or receive time-outs (gSOAP's send and receive loops wait with select),
-// else it is made blocking.
-SOAP_SOCKET ConnectTcp(soap* s, const char* host, int port) {
+// Connects to host:port, or where VLWS_CONNECT_TO sends it, trying the addresses of family
+// (AF_UNSPEC: all) in the resolver's order. The socket stays non-blocking when the context has
+// send or receive time-outs (gSOAP's send and receive loops wait with select), else it is made
+// blocking.
+SOAP_SOCKET ConnectTcp(soap* s, const char* host, int port, int family) {
   VLString addr;
   int addrPort;
   if (VLConnectTo::Resolve(host, port, &addr, &addrPort)) {
@@ -237,7 +244,7 @@ SOAP_SOCKET ConnectTcp(soap* s, const char* host, int port) {
   }
   addrinfo hints;
   memset(&hints, 0, sizeof(hints));
-  hints.ai_family = AF_UNSPEC;
+  hints.ai_family = family;
   hints.ai_socktype = SOCK_STREAM;
   char service[16];
   snprintf(service, sizeof(service), "%d", addrPort);
@@ -266,7 +273,7 @@ SOAP_SOCKET ConnectTcp(soap* s, const char* host, int port) {
 bool SendAll(soap* s, int fd, const char* data, size_t n) {
   long long deadline = Deadline(s, s->send_timeout);
   while (n > 0) {
-    ssize_t r = send(fd, data, n, MSG_NOSIGNAL);
+    ssize_t r = send(fd, data, n, kNoSignal);
     if (r > 0) {
       data += r;
       n -= r;
@@ -425,7 +432,9 @@ SOAP_SOCKET Open(soap* s, const char* endpoint, const char* host, int port) {
   d->received.Reset();
   bool tls = strncasecmp(endpoint, "https:", 6) == 0;
   bool proxy = s->proxy_host && *s->proxy_host;
-  SOAP_SOCKET fd = proxy ? ConnectTcp(s, s->proxy_host, s->proxy_port) : ConnectTcp(s, host, port);
+  int family = d->family;
+  d->family = AF_UNSPEC;
+  SOAP_SOCKET fd = proxy ? ConnectTcp(s, s->proxy_host, s->proxy_port, family) : ConnectTcp(s, host, port, family);
   if (!soap_valid_socket(fd)) return SOAP_INVALID_SOCKET;
   if (tls && ((proxy && ProxyConnect(s, fd, host, port) != SOAP_OK) || StartTls(s, fd, host, port) != SOAP_OK)) {
     close(fd);
@@ -534,6 +543,7 @@ int Plugin(soap* s, soap_plugin* p, void*) {
   d->fsend = s->fsend;
   d->userAgent = NULL;
   d->tlsPort = 0;
+  d->family = AF_UNSPEC;
   d->exchangeDeadline = -1;
   p->id = kPluginId;
   p->data = d;
@@ -553,7 +563,7 @@ int NoSignalWrite(BIO* b, const char* data, int len) {
   int fd = -1;
   BIO_get_fd(b, &fd);
   errno = 0;
-  int r = static_cast<int>(send(fd, data, len, MSG_NOSIGNAL));
+  int r = static_cast<int>(send(fd, data, len, kNoSignal));
   BIO_clear_retry_flags(b);
   if (r <= 0 && BIO_sock_should_retry(r)) BIO_set_retry_write(b);
   return r;
@@ -597,7 +607,17 @@ BIO* VLSoapTransport::NewSocketBIO(int fd) {
 int VLSoapTransport::Install(soap* s) {
   soap_init_vl_log();
   AutoSSL::InitOpenSSL();
+  SetTimeouts(s, VL_WS_SetupParams2::kDefaultSendTimeout, VL_WS_SetupParams2::kDefaultRecvTimeout);
+  s->socket_flags = kNoSignal;
   return soap_register_plugin_arg(s, Plugin, NULL);
+}
+
+void VLSoapTransport::SetNextFamily(soap* s, int family) { Data(s)->family = family; }
+
+void VLSoapTransport::SetTimeouts(soap* s, int sendTimeout, int recvTimeout) {
+  s->send_timeout = sendTimeout;
+  s->connect_timeout = sendTimeout;
+  s->recv_timeout = recvTimeout;
 }
 
 void VLSoapTransport::SetUserAgent(soap* s, const char* userAgent) { Data(s)->userAgent = userAgent; }

@@ -9,7 +9,7 @@
 //   same host and port (VLTlsSessionCache), which the close keeps once the answer is read.
 // - TLS writes go through a socket BIO that sends with MSG_NOSIGNAL, so a peer that hangs up
 //   gives an error result and never a SIGPIPE (plain sockets get the same flag through the
-//   context's socket_flags, set by the service objects).
+//   context's socket_flags, set by Install).
 // - receive: one wait of at most recv_timeout for data, however the TLS records are cut.
 // - deadline: the whole exchange on a connection (connect, TLS handshake, request and answer)
 //   ends within send_timeout and recv_timeout together, so that an answer trickling in a byte
@@ -35,8 +35,19 @@
 
 class VLSoapTransport {
  public:
-  // Installs the transport on a context. Returns SOAP_OK or the registration's error.
+  // Makes soap one of the library's connections: the default time-outs of the handles' settings,
+  // sends that raise no SIGPIPE and the transport's callbacks. TLS is set up apart, by
+  // Setup_SSL_Client_CACerts, on the contexts that open "https" URLs. Returns SOAP_OK or the
+  // registration's error.
   static int Install(soap* soap);
+
+  // The next connection of the context tries only addresses of family (AF_INET or AF_INET6);
+  // the ones after it any again.
+  static void SetNextFamily(soap* soap, int family);
+
+  // The context's time-outs in seconds: sending and connecting (TLS handshake included) within
+  // sendTimeout, receiving within recvTimeout.
+  static void SetTimeouts(soap* soap, int sendTimeout, int recvTimeout);
 
   // The User-Agent of the context's requests: userAgent when not empty, else "gSOAP/2.7". The
   // text is referenced, not copied. Requires Install.
@@ -45,6 +56,19 @@ class VLSoapTransport {
   // A BIO over the connected socket fd (not closed with the BIO) that writes with
   // send(MSG_NOSIGNAL) and otherwise behaves as OpenSSL's socket BIO. Null when out of memory.
   static BIO* NewSocketBIO(int fd);
+};
+
+// A context of its own for a request that needs no client handle, installed as above; what the
+// requests left in it is released with it.
+class VLSoapContext : public soap {
+ public:
+  VLSoapContext() : soap(SOAP_C_UTFSTRING) { VLSoapTransport::Install(this); }
+  ~VLSoapContext() {
+    soap_destroy(this);
+    soap_end(this);
+  }
+  VLSoapContext(const VLSoapContext&) = delete;
+  VLSoapContext& operator=(const VLSoapContext&) = delete;
 };
 
 #endif  // VLSOAPTRANSPORT_H

@@ -166,8 +166,6 @@ extern "C" VL_WS_Status VL_WS_initialize(VL_WS_Handle* handle, const VL_WS_Setup
   p.DestinationTypeID = in.DestinationTypeID;
   p.UserName = in.UserName;
   p.Password = in.Password;
-  p.SendTimeout = 30;
-  p.RecvTimeout = 88;
   if (in.ProxyHost) {
     p.ProxyHost = in.ProxyHost;
     if (*in.ProxyHost) {

@@ -161,11 +161,13 @@ extern "C" VL_WS_Status VL_WS_getLocalIPAddr(VL_WS_Handle* handle, VL_WS_String*
   VLString found = ResolverAddress();
   if (found.empty()) {
     // The address of the interface that reaches the store: the local end of a connection to the
-    // catalogue service.
+    // catalogue service. Only an IPv4 address is wanted, so only IPv4 addresses of the store are
+    // tried: a dual-stack device whose store name resolves to IPv6 first has one too.
     VLString url = client->m_Params.ServiceBaseURL + "RealTimeBrowse.asmx";
     VLHttpURL parts;
     if (!VLHttpGet::SplitURL(url.c_str(), &parts)) return VL_WS_E_UNEXPECTED;
     VLTransportConnection connection(&client->m_RealTimeBrowse);
+    VLSoapTransport::SetNextFamily(&client->m_RealTimeBrowse, AF_INET);
     if (!connection.Open(url.c_str(), parts.host.c_str(), parts.port)) return VL_WS_E_CONNECT;
     struct sockaddr_in local = {};
     socklen_t length = sizeof local;
@@ -204,18 +206,9 @@ VL_WS_Status AskServerTime(soap* context, time_t* serverTime) {
 extern "C" VL_WS_Status VL_WS_getServerTime(time_t* serverTime) {
   if (serverTime == 0) return VL_WS_E_INVALID_ARGUMENT;
   *serverTime = -1;
-  // A context of its own: the call needs no handle.
-  soap context(SOAP_C_UTFSTRING);
-  context.send_timeout = 30;
-  context.connect_timeout = 30;
-  context.recv_timeout = 88;
-  context.socket_flags = MSG_NOSIGNAL;
-  VLSoapTransport::Install(&context);
+  VLSoapContext context;  // the call needs no handle
   time_t when = -1;
   VL_WS_Status status = AskServerTime(&context, &when);
   if (status == VL_WS_OK) *serverTime = when;
-  // A failed connection leaves its fault record in the context.
-  soap_destroy(&context);
-  soap_end(&context);
   return status;
 }

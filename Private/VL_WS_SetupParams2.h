@@ -33,9 +33,11 @@ struct VL_WS_SetupParams2 {
   VLString ProxyUserName;
   VLString ProxyPassword;
   // Seconds. Each bounds one wait; together they bound a whole exchange, from connecting to the
-  // last byte of the answer (VLSoapTransport).
-  int SendTimeout = 30;  // for sending and for connecting (TLS handshake included)
-  int RecvTimeout = 88;  // for receiving
+  // last byte of the answer (VLSoapTransport). Every context starts with the defaults.
+  static const int kDefaultSendTimeout = 30;
+  static const int kDefaultRecvTimeout = 88;
+  int SendTimeout = kDefaultSendTimeout;  // for sending and for connecting (TLS handshake included)
+  int RecvTimeout = kDefaultRecvTimeout;  // for receiving
   bool AuthTokenValid = false;  // the last answer of the store's token check
   VL_WS_AccessType AccessType = UNKNOWN;
   VLString ApplicationRevision;
