@@ -5,8 +5,14 @@
 #include "VLAssert.h"
 #include "VLFile.h"
 #include "VLHttpGet.h"
-#include "VLStoreHosts.h"
 #include "VLUtilities.h"
+
+namespace {
+
+// A conditional download of an image that has not changed answers "304 Not Modified".
+const VLHttpGet::Kind kImage = {false, VL_WS_E_UNEXPECTED, VL_WS_E_HTTP_NOT_FOUND, VL_WS_E_HTTP_NOT_MODIFIED};
+
+}  // namespace
 
 // Where the image's bytes go: appended to a string or written to an open file.
 class BoxArtDownloader::Sink {
@@ -80,22 +86,11 @@ VL_WS_Status BoxArtDownloader::DownloadToFile(const VLString& prefix, VL_WS_BoxA
 
 VL_WS_Status BoxArtDownloader::Fetch(const VLString& prefix, VL_WS_BoxArtSize size, const VLString& ifModifiedSince,
                                      Sink& sink, unsigned int* length, VLString* lastModified) {
-  VLString request = "GET " + VLUtilities::GetBoxArtImagePath(prefix.c_str(), size) + " HTTP/1.1\r\n";
-  if (!ifModifiedSince.empty()) request += "If-Modified-Since: " + ifModifiedSince + "\r\n";
-  request += "User-Agent: DUDUVud\r\nHost: " VL_STORE_IMAGE_HOST "\r\n\r\n";
+  VLString fields;
+  if (!ifModifiedSince.empty()) fields = "If-Modified-Since: " + ifModifiedSince + "\r\n";
   VLHttpGet get(m_Soap);  // closes its connection on every way out
-  switch (get.Run(VLUtilities::GetBoxArtImageURL(prefix.c_str(), size).c_str(), VL_STORE_IMAGE_HOST, 80, request)) {
-    case VLHttpGet::HTTP_OK:
-      break;
-    case VLHttpGet::HTTP_CONNECT_FAILED:
-      return VL_WS_E_CONNECT;
-    case VLHttpGet::HTTP_NOT_FOUND:
-      return VL_WS_E_HTTP_NOT_FOUND;
-    case VLHttpGet::HTTP_NOT_MODIFIED:
-      return VL_WS_E_HTTP_NOT_MODIFIED;
-    default:
-      return VL_WS_E_NETWORK;
-  }
+  VL_WS_Status status = get.Get(VLUtilities::GetBoxArtImageURL(prefix.c_str(), size).c_str(), kImage, fields);
+  if (status != VL_WS_OK) return status;
   // No image is that large: such a length would only fill the disk or the memory.
   if (get.ContentLength() > kMaxContentLength) return VL_WS_E_NETWORK;
   *length = static_cast<unsigned int>(get.ContentLength());

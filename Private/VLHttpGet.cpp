@@ -3,6 +3,8 @@
 #include <string.h>
 #include <strings.h>
 
+#include "VL_WS_Records.h"
+
 namespace {
 
 const char kOK[] = "HTTP/1.1 200 OK\r\n";
@@ -65,14 +67,21 @@ VLHttpGet::VLHttpGet(soap* context)
   m_Piece[0] = 0;
 }
 
-VLHttpGet::Result VLHttpGet::Run(const char* url, const char* host, int port, const VLString& request) {
+VL_WS_Status VLHttpGet::Get(const char* url, const Kind& kind, const VLString& fields) {
   m_Received = 0;
   m_Piece[0] = 0;
   m_Fields = m_HeaderEnd = m_Body = 0;
   m_BodyReceived = 0;
   m_ContentLength = 0;
-  if (!m_Connection.Open(url, host, port)) return HTTP_CONNECT_FAILED;
-  Result result = HTTP_SEND_FAILED;
+  VLHttpURL parts;
+  if (!SplitURL(url, &parts)) return kind.badURL;
+  const VLString host = "Host: " + parts.authority + "\r\n";
+  const char agent[] = "User-Agent: DUDUVud\r\n";
+  VLString request = "GET /" + parts.path + " HTTP/1.1\r\n" + fields;
+  request += kind.hostFirst ? host + agent : agent + host;
+  request += "\r\n";
+  if (!m_Connection.Open(url, parts.host.c_str(), parts.port)) return VL_WS_E_CONNECT;
+  VL_WS_Status status = VL_WS_E_NETWORK;
   if (m_Connection.Send(request.c_str(), request.length())) {
     // TCP may cut the header anywhere: read on until it ends, the buffer is full or the
     // connection ends (the transport's deadline included).
@@ -82,31 +91,31 @@ VLHttpGet::Result VLHttpGet::Run(const char* url, const char* host, int port, co
       m_Received += got;
     }
     m_Piece[m_Received] = 0;
-    result = m_Received == 0 ? HTTP_NOTHING_RECEIVED : ReadHeader();
+    if (m_Received > 0) status = ReadHeader(kind);
   }
-  if (result != HTTP_OK) Close();
-  return result;
+  if (status != VL_WS_OK) Close();
+  return status;
 }
 
-VLHttpGet::Result VLHttpGet::ReadHeader() {
-  if (StartsWith(m_Piece, kNotFound)) return HTTP_NOT_FOUND;
-  if (StartsWith(m_Piece, kNotModified)) return HTTP_NOT_MODIFIED;
-  if (!StartsWith(m_Piece, kOK)) return HTTP_BAD_ANSWER;
+VL_WS_Status VLHttpGet::ReadHeader(const Kind& kind) {
+  if (StartsWith(m_Piece, kNotFound)) return kind.notFound;
+  if (StartsWith(m_Piece, kNotModified)) return kind.notModified;
+  if (!StartsWith(m_Piece, kOK)) return VL_WS_E_NETWORK;
   m_Fields = m_Piece + strlen(kOK) - 2;
   m_HeaderEnd = static_cast<const char*>(memmem(m_Fields, m_Piece + m_Received - m_Fields, "\r\n\r\n", 4));
   VLString length;
   if (m_HeaderEnd == 0 || !Field("Content-Length", &length) || !ParseNumber(length, 18, &m_ContentLength))
-    return HTTP_BAD_ANSWER;
+    return VL_WS_E_NETWORK;
   // The requests ask for no encoding: an encoded body is not the one they can read.
   VLString encoding;
-  if (Field("Content-Encoding", &encoding) && strcasecmp(encoding.c_str(), "identity") != 0) return HTTP_BAD_ANSWER;
+  if (Field("Content-Encoding", &encoding) && strcasecmp(encoding.c_str(), "identity") != 0) return VL_WS_E_NETWORK;
   m_Body = m_HeaderEnd + 4;
   m_BodyReceived = static_cast<size_t>(m_Piece + m_Received - m_Body);
   if (m_BodyReceived > m_ContentLength) {
     m_BodyReceived = static_cast<size_t>(m_ContentLength);
     m_Piece[m_Body - m_Piece + m_BodyReceived] = 0;
   }
-  return HTTP_OK;
+  return VL_WS_OK;
 }
 
 bool VLHttpGet::Field(const char* name, VLString* value) const {

@@ -1,12 +1,13 @@
-// VLHttpGet: one small hand-built HTTP/1.1 request of the library (the device environment, the
+// VLHttpGet: one small hand-built HTTP/1.1 GET of the library (the device environment, the
 // server time, the bandwidth probe, box-art images) over the connection of a SOAP context
-// (VLTransportConnection): send the request, receive the first piece of the answer, up to the end
-// of its header however TCP cuts it, check its status line and "Content-Length", and find the
-// body. The rest of the body is read with ReceiveBody (small bodies) or Receive.
+// (VLTransportConnection): build the request from the URL, send it, receive the first piece of
+// the answer, up to the end of its header however TCP cuts it, check its status line and
+// "Content-Length", find the body, and give the caller's status for what came back. The rest of
+// the body is read with ReceiveBody (small bodies) or Receive.
 //
-// The answer must start with "HTTP/1.1 200 OK\r\n" (or one of the other statuses of Result),
-// and its whole header, with a "Content-Length" above 0, must fit into the first piece. The
-// connection is closed by Close or the destructor.
+// The answer must start with "HTTP/1.1 200 OK\r\n" (or be a 404 or 304), and its whole header,
+// with a "Content-Length" above 0, must fit into the first piece. The connection is closed by
+// Close or the destructor.
 #ifndef VLHTTPGET_H
 #define VLHTTPGET_H
 
@@ -15,6 +16,7 @@
 
 #include "VLString.h"
 #include "VLTransportConnection.h"
+#include "VL_WS_Types.h"
 
 // The parts of an absolute URL "scheme://host[:port]/path".
 struct VLHttpURL {
@@ -26,15 +28,17 @@ struct VLHttpURL {
 
 class VLHttpGet {
  public:
-  enum Result {
-    HTTP_OK,                // 200 OK with a Content-Length above 0 and the end of the header
-    HTTP_CONNECT_FAILED,    // no connection (TCP, proxy tunnel or TLS handshake)
-    HTTP_SEND_FAILED,
-    HTTP_NOTHING_RECEIVED,  // the peer closed, the receive time-out passed or the receive failed
-    HTTP_NOT_FOUND,         // "HTTP/1.1 404 Not Found"
-    HTTP_NOT_MODIFIED,      // "HTTP/1.1 304 Not Modified"
-    HTTP_BAD_ANSWER,        // another status, no Content-Length above 0, a Content-Encoding
-                            // other than "identity", or a header cut short
+  // What differs between the library's requests: the order of the two header fields that every
+  // request has, and the caller's statuses for a URL that does not split, "404 Not Found" and
+  // "304 Not Modified". For every caller a connection that cannot be made (TCP, proxy tunnel or
+  // TLS handshake) is VL_WS_E_CONNECT, and any other failure VL_WS_E_NETWORK: a failed send, no
+  // answer, another status, no "Content-Length" above 0, a "Content-Encoding" other than
+  // "identity" (the requests ask for none) or a header cut short.
+  struct Kind {
+    bool hostFirst;  // "Host" before "User-Agent" (the bandwidth probe), else after it
+    VL_WS_Status badURL;
+    VL_WS_Status notFound;
+    VL_WS_Status notModified;
   };
 
   // The first piece of an answer, the whole header and what came with it, is received into a
@@ -49,24 +53,25 @@ class VLHttpGet {
   VLHttpGet(const VLHttpGet&) = delete;
   VLHttpGet& operator=(const VLHttpGet&) = delete;
 
-  // Connects to url (its host and port given apart, as the context's open callback takes them),
-  // sends request whole and reads the first piece of the answer. On any result but HTTP_OK the
-  // connection is closed already.
-  Result Run(const char* url, const char* host, int port, const VLString& request);
+  // Sends "GET /<path> HTTP/1.1", then fields (whole header lines, each ending in "\r\n", or
+  // none), "User-Agent: DUDUVud" and "Host: <authority>" in kind's order and the blank line, to
+  // url's host and port, and reads the first piece of the answer. VL_WS_OK for a 200 answer, else
+  // the status of Kind; on any status but VL_WS_OK the connection is closed already.
+  VL_WS_Status Get(const char* url, const Kind& kind, const VLString& fields = VLString());
 
-  // After HTTP_OK: the announced body length, and the body bytes that came with the header (at
+  // After VL_WS_OK: the announced body length, and the body bytes that came with the header (at
   // most ContentLength of them; the text after them is terminated).
   uint64_t ContentLength() const { return m_ContentLength; }
   const char* Body() const { return m_Body; }
   size_t BodyReceived() const { return m_BodyReceived; }
-  // After HTTP_OK: the value of the header field name (compared ignoring case), without the
+  // After VL_WS_OK: the value of the header field name (compared ignoring case), without the
   // blanks around it. False when the header has no such field.
   bool Field(const char* name, VLString* value) const;
 
   // One more receive of at most n bytes of the body: the count received, 0 when the connection
   // ended, the receive time-out passed or the receive failed.
   size_t Receive(char* buffer, size_t n);
-  // After HTTP_OK: receives the rest of a body that fits into the first piece's buffer, so that
+  // After VL_WS_OK: receives the rest of a body that fits into the first piece's buffer, so that
   // Body() holds all ContentLength bytes (terminated). False when it does not fit or the
   // connection ended before.
   bool ReceiveBody();
@@ -74,7 +79,7 @@ class VLHttpGet {
 
  private:
   // Checks the first piece (terminated, m_Received bytes): status, header end, Content-Length.
-  Result ReadHeader();
+  VL_WS_Status ReadHeader(const Kind& kind);
 
   VLTransportConnection m_Connection;
   char m_Piece[kPieceSize];

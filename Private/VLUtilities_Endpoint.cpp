@@ -11,6 +11,9 @@ namespace {
 
 const int kProductionEnv = 2;
 
+// Any answer but a digit chooses production; only a connection that cannot be made fails.
+const VLHttpGet::Kind kEnvironmentQuery = {false, VL_WS_E_UNEXPECTED, VL_WS_E_NETWORK, VL_WS_E_NETWORK};
+
 // The endpoint table: environment 0 is the staging API host, 1 the staging host and anything
 // else production. Adult content lives under "/aac/api/" on the staging API host.
 const char* BaseURL(int contentType, int env) {
@@ -30,16 +33,13 @@ const char* BaseURL(int contentType, int env) {
 bool AskDeviceEnvironment(soap* context, const char* destinationUniqueID, int destinationTypeID, int* env) {
   char type[16];
   snprintf(type, sizeof(type), "%d", destinationTypeID);
-  VLString target = "/device/env/?d=" + VLUtilities::URLEncode(destinationUniqueID) + "&dt=" + type;
-  VLString url = "https://" VL_STORE_PRODUCTION_HOST + target;
-  VLString request = "GET " + target + " HTTP/1.1\r\n";
-  request += "User-Agent: DUDUVud\r\nHost: " VL_STORE_PRODUCTION_HOST "\r\n\r\n";
-
+  VLString url = "https://" VL_STORE_PRODUCTION_HOST "/device/env/?d=" + VLUtilities::URLEncode(destinationUniqueID) +
+                 "&dt=" + type;
   VLHttpGet get(context);
-  VLHttpGet::Result result = get.Run(url.c_str(), VL_STORE_PRODUCTION_HOST, 443, request);
-  if (result == VLHttpGet::HTTP_CONNECT_FAILED) return false;
-  bool digit = result == VLHttpGet::HTTP_OK && get.ContentLength() == 1 && get.ReceiveBody() &&
-               get.Body()[0] >= '0' && get.Body()[0] <= '9';
+  VL_WS_Status status = get.Get(url.c_str(), kEnvironmentQuery);
+  if (status == VL_WS_E_CONNECT) return false;
+  bool digit = status == VL_WS_OK && get.ContentLength() == 1 && get.ReceiveBody() && get.Body()[0] >= '0' &&
+               get.Body()[0] <= '9';
   *env = digit ? get.Body()[0] - '0' : kProductionEnv;
   return true;
 }

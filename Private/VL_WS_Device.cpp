@@ -24,11 +24,14 @@ namespace {
 
 VLLogArea s_Log(VLWSAELOG_AREA_NAME);
 
-const char kTimePath[] = "/device/time/";
-
 // The bandwidth probe reads at most this many body bytes, in pieces of at most kProbePiece.
 const unsigned int kProbeBytes = 204800;
 const size_t kProbePiece = 2048;
+// The probe names the host before the agent, and its URL, which the store's configuration gives,
+// may not split.
+const VLHttpGet::Kind kProbe = {true, VL_WS_E_BANDWIDTH_BAD_URL, VL_WS_E_HTTP_NOT_FOUND, VL_WS_E_NETWORK};
+// The store's time service: any answer but the time is a network failure.
+const VLHttpGet::Kind kTime = {false, VL_WS_E_UNEXPECTED, VL_WS_E_NETWORK, VL_WS_E_NETWORK};
 
 // The probe URL of the store's configuration: the value of its last item "BandwithCheckURL"
 // (the key in any letter case); url is left as it is when there is none. Returns the status of
@@ -103,22 +106,10 @@ extern "C" VL_WS_Status VL_WS_checkBandwidth(VL_WS_Handle* handle, unsigned int*
     if (status != VL_WS_OK) return status;
     if (probeURL.empty()) return VL_WS_E_BANDWIDTH_NO_URL;
   }
-  VLHttpURL url;
-  if (!VLHttpGet::SplitURL(probeURL.c_str(), &url)) return VL_WS_E_BANDWIDTH_BAD_URL;
-
   VLProxySuspension direct(client->m_RealTimeBrowse);
   VLHttpGet get(&client->m_RealTimeBrowse);
-  VLString request = "GET /" + url.path + " HTTP/1.1\r\nHost: " + url.authority + "\r\nUser-Agent: DUDUVud\r\n\r\n";
-  switch (get.Run(probeURL.c_str(), url.host.c_str(), url.port, request)) {
-    case VLHttpGet::HTTP_OK:
-      break;
-    case VLHttpGet::HTTP_CONNECT_FAILED:
-      return VL_WS_E_CONNECT;
-    case VLHttpGet::HTTP_NOT_FOUND:
-      return VL_WS_E_HTTP_NOT_FOUND;
-    default:
-      return VL_WS_E_NETWORK;
-  }
+  VL_WS_Status status = get.Get(probeURL.c_str(), kProbe);
+  if (status != VL_WS_OK) return status;
   // Only the body after the header is timed; the bytes that came with the header count as if
   // they had been.
   unsigned int length = get.ContentLength() < kProbeBytes ? static_cast<unsigned int>(get.ContentLength()) : kProbeBytes;
@@ -186,17 +177,8 @@ namespace {
 // One question to the store's time service on context: the time, or the status of the failure.
 VL_WS_Status AskServerTime(soap* context, time_t* serverTime) {
   VLHttpGet get(context);
-  VLString request = VLString("GET ") + kTimePath + " HTTP/1.1\r\n";
-  request += "User-Agent: DUDUVud\r\nHost: " VL_STORE_PRODUCTION_HOST "\r\n\r\n";
-  VLString url = VLString("http://" VL_STORE_PRODUCTION_HOST) + kTimePath;
-  switch (get.Run(url.c_str(), VL_STORE_PRODUCTION_HOST, 80, request)) {
-    case VLHttpGet::HTTP_OK:
-      break;
-    case VLHttpGet::HTTP_CONNECT_FAILED:
-      return VL_WS_E_CONNECT;
-    default:
-      return VL_WS_E_NETWORK;
-  }
+  VL_WS_Status status = get.Get("http://" VL_STORE_PRODUCTION_HOST "/device/time/", kTime);
+  if (status != VL_WS_OK) return status;
   if (!get.ReceiveBody() || !ParseServerTime(get.Body(), serverTime)) return VL_WS_E_UNEXPECTED;
   return VL_WS_OK;
 }

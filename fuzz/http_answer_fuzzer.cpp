@@ -29,7 +29,8 @@ soap* Context() {
 void (*const kReaders[])() = {
     [] {
       VLHttpGet get(Context());
-      if (get.Run(kImageURL, "images.ostrel.example", 80, "GET / HTTP/1.1\r\n\r\n") != VLHttpGet::HTTP_OK) return;
+      const VLHttpGet::Kind kind = {false, VL_WS_E_UNEXPECTED, VL_WS_E_HTTP_NOT_FOUND, VL_WS_E_HTTP_NOT_MODIFIED};
+      if (get.Get(kImageURL, kind) != VL_WS_OK) return;
       VLString value;
       get.Field("Last-Modified", &value);
       if (get.ReceiveBody()) return;

@@ -84,8 +84,8 @@ TEST_F(BoxArtDownloaderTest, ReadsTheImageAndItsValidators) {
   EXPECT_EQ(0u, m_Downloader.GetContentLength());
 }
 
-// Anything but a complete 200 answer fails and leaves no bytes. (VLHttpGet's own tests have every
-// form of answer it does not take; here is one of them.)
+// Anything but a complete image fails and leaves no bytes. (VLHttpGet's own tests have every
+// form of answer it does not take; here are the downloader's own statuses and checks.)
 TEST_F(BoxArtDownloaderTest, AnswersOtherThanACompleteImageFail) {
   const struct {
     std::string reply;
@@ -94,8 +94,6 @@ TEST_F(BoxArtDownloaderTest, AnswersOtherThanACompleteImageFail) {
       {"HTTP/1.1 404 Not Found\r\nContent-Length: 3\r\n\r\nno!", VL_WS_E_HTTP_NOT_FOUND},
       {std::string("HTTP/1.1 304 Not Modified\r\nLast-Modified: ") + kLastModified + "\r\n\r\n",
        VL_WS_E_HTTP_NOT_MODIFIED},
-      {"HTTP/1.1 500 Internal Server Error\r\nContent-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
-      {"", VL_WS_E_NETWORK},  // the host closes without answering
       {"HTTP/1.1 200 OK\r\nContent-Length: 100\r\n\r\nshort", VL_WS_E_NETWORK},
       {"HTTP/1.1 200 OK\r\nContent-Length: 33554433\r\n\r\nabc", VL_WS_E_NETWORK},  // above 32 MiB
   };
@@ -125,10 +123,8 @@ TEST_F(BoxArtDownloaderTest, FileIsReplacedOnlyByACompleteImage) {
 
   const char* failures[] = {
       "HTTP/1.1 304 Not Modified\r\n\r\n",
-      "HTTP/1.1 404 Not Found\r\nContent-Length: 1\r\n\r\nx",
       "HTTP/1.1 200 OK\r\nContent-Length: 100000\r\n\r\nonly the start",
       "HTTP/1.1 200 OK\r\nContent-Length: 33554433\r\n\r\nabc",
-      "",
   };
   for (const char* reply : failures) {
     SCOPED_TRACE(reply);

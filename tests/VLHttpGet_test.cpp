@@ -1,51 +1,50 @@
-// VLHttpGet, the hand-built HTTP exchange of box art, the server time and the bandwidth probe,
-// against canned answers of a loopback server: what it sends, how it reads answers and which
-// answers it refuses.
+// VLHttpGet, the hand-built HTTP GET of box art, the server time, the bandwidth probe and the
+// device-environment query, against canned answers of a loopback server: what it sends, how it
+// reads answers, and the status it gives each answer it refuses.
 #include <gtest/gtest.h>
-#include <sys/socket.h>
 
 #include <string>
 
 #include "VLHttpGet.h"
 #include "VLSoapTransport.h"
+#include "VLStoreHosts.h"
 #include "VLTestServer.h"
+#include "VL_WS.h"
 
 namespace {
 
-// A context as the library's plain requests use it, with short time-outs.
-class HttpContext : public soap {
+// The server time's host: the library reads VLWS_CONNECT_TO at its first connection, so its
+// stand-in starts before any test connects.
+class ServerTimeHostFirst : public testing::Environment {
  public:
-  HttpContext() : soap(SOAP_C_UTFSTRING) {
-    send_timeout = connect_timeout = recv_timeout = 5;
-    socket_flags = MSG_NOSIGNAL;
-    VLSoapTransport::Install(this);
-  }
-  // A failed connection leaves its fault record in the context.
-  ~HttpContext() {
-    soap_destroy(this);
-    soap_end(this);
-  }
+  void SetUp() override { VLStandInServer(VL_STORE_PRODUCTION_HOST, 80); }
 };
+testing::Environment* const s_ServerTimeHost = testing::AddGlobalTestEnvironment(new ServerTimeHostFirst);
+
+// Statuses that tell the callers' own entries apart from the ones all callers share.
+const VLHttpGet::Kind kKind = {false, VL_WS_E_BANDWIDTH_BAD_URL, VL_WS_E_HTTP_NOT_FOUND, VL_WS_E_HTTP_NOT_MODIFIED};
 
 class HttpGet : public testing::Test {
  protected:
-  VLHttpGet::Result Get(const std::string& reply) {
+  HttpGet() { VLSoapTransport::SetTimeouts(&m_Context, 5, 5); }
+
+  VL_WS_Status Get(const std::string& reply) {
     m_Server.SetReply(reply);
     return Run(m_Server.Port());
   }
-  VLHttpGet::Result Run(int port) {
+  VL_WS_Status Run(int port, const VLHttpGet::Kind& kind = kKind, const VLString& fields = VLString()) {
     std::string url = "http://127.0.0.1:" + std::to_string(port) + "/probe";
-    return m_Get.Run(url.c_str(), "127.0.0.1", port, "GET /probe HTTP/1.1\r\nHost: probe\r\n\r\n");
+    return m_Get.Get(url.c_str(), kind, fields);
   }
 
   VLTestServer m_Server;
-  HttpContext m_Context;
+  VLSoapContext m_Context;
   VLHttpGet m_Get{&m_Context};
 };
 
-TEST_F(HttpGet, FindsTheBodyAndTheHeaderFields) {
-  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\ncontent-length:  5 \r\nLast-Modified: Mon, 03 Jan 2011 "
-                                    "10:00:00 GMT\r\nX-Empty:\r\n\r\nhello"));
+TEST_F(HttpGet, BuildsTheRequestFromTheURLAndFindsTheBodyAndTheHeaderFields) {
+  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\ncontent-length:  5 \r\nLast-Modified: Mon, 03 Jan 2011 "
+                          "10:00:00 GMT\r\nX-Empty:\r\n\r\nhello"));
   EXPECT_EQ(5u, m_Get.ContentLength());
   ASSERT_EQ(5u, m_Get.BodyReceived());
   EXPECT_STREQ("hello", m_Get.Body());
@@ -56,17 +55,28 @@ TEST_F(HttpGet, FindsTheBodyAndTheHeaderFields) {
   EXPECT_STREQ("", value.c_str());
   EXPECT_FALSE(m_Get.Field("Content", &value));
   EXPECT_FALSE(m_Get.Field("ETag", &value));
+  std::string host = "Host: 127.0.0.1:" + std::to_string(m_Server.Port()) + "\r\n";
   ASSERT_EQ(1u, m_Server.Requests().size());
-  EXPECT_EQ("GET /probe HTTP/1.1\r\nHost: probe\r\n\r\n", m_Server.Requests()[0]);
+  EXPECT_EQ("GET /probe HTTP/1.1\r\nUser-Agent: DUDUVud\r\n" + host + "\r\n", m_Server.Requests()[0]);
+
+  // Extra fields come first; the bandwidth probe's kind names the host before the agent.
+  const VLHttpGet::Kind hostFirst = {true, VL_WS_E_UNEXPECTED, VL_WS_E_NETWORK, VL_WS_E_NETWORK};
+  EXPECT_EQ(VL_WS_OK, Run(m_Server.Port(), hostFirst, "If-Modified-Since: x\r\n"));
+  EXPECT_EQ("GET /probe HTTP/1.1\r\nIf-Modified-Since: x\r\n" + host + "User-Agent: DUDUVud\r\n\r\n",
+            m_Server.Requests().back());
+
+  // A URL that does not split is refused before anything is sent.
+  EXPECT_EQ(VL_WS_E_BANDWIDTH_BAD_URL, m_Get.Get("http://127.0.0.1/", kKind));
+  EXPECT_EQ(2u, m_Server.Requests().size());
 }
 
 TEST_F(HttpGet, ABodyBeyondItsLengthIsCutAndALongerOneIsReadOn) {
-  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 3\r\n\r\nabcdef"));
+  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 3\r\n\r\nabcdef"));
   EXPECT_EQ(3u, m_Get.BodyReceived());
   EXPECT_STREQ("abc", m_Get.Body());
 
   std::string body(10000, 'x');
-  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 10000\r\n\r\n" + body));
+  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 10000\r\n\r\n" + body));
   size_t total = m_Get.BodyReceived();
   EXPECT_LT(total, 2048u);
   char piece[4096];
@@ -74,57 +84,72 @@ TEST_F(HttpGet, ABodyBeyondItsLengthIsCutAndALongerOneIsReadOn) {
   EXPECT_EQ(10000u, total);
 }
 
-TEST_F(HttpGet, OtherAnswersAreNamed) {
+// The one mapping of answers to statuses: 404 and 304 are the caller's, everything else but a
+// complete 200 answer a network failure.
+TEST_F(HttpGet, EveryOtherAnswerHasItsStatus) {
   static const char kNulInHeader[] = "HTTP/1.1 200 OK\r\nX-Nul: a\0b\r\nContent-Length: 1\r\n\r\nx";
   struct {
     std::string reply;
-    VLHttpGet::Result result;
+    VL_WS_Status status;
   } cases[] = {
-      {"HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n", VLHttpGet::HTTP_NOT_FOUND},
-      {"HTTP/1.1 304 Not Modified\r\n\r\n", VLHttpGet::HTTP_NOT_MODIFIED},
-      {"HTTP/1.1 500 Internal Server Error\r\nContent-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
-      {"HTTP/1.0 200 OK\r\nContent-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
-      {"HTTP/1.1 200 OK\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n", VLHttpGet::HTTP_BAD_ANSWER},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 12x\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
-      {"HTTP/1.1 200 OK\r\nContent-Length: -1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 99999999999999999999\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
-      {"HTTP/1.1 200 OK\r\nX-Body: Content-Length: 1\r\n\r\nx", VLHttpGet::HTTP_BAD_ANSWER},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 1\r\n", VLHttpGet::HTTP_BAD_ANSWER},
+      {"HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n", VL_WS_E_HTTP_NOT_FOUND},
+      {"HTTP/1.1 304 Not Modified\r\n\r\n", VL_WS_E_HTTP_NOT_MODIFIED},
+      {"HTTP/1.1 500 Internal Server Error\r\nContent-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.0 200 OK\r\nContent-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 12x\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: -1\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 99999999999999999999\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nX-Body: Content-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 1\r\n", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 1\r\nContent-Encoding: gzip\r\n\r\nx", VL_WS_E_NETWORK},
+      {"HTTP/1.1 200 OK\r\nContent-Length: 1\r\nContent-Encoding: Identity\r\n\r\nx", VL_WS_OK},
       // The whole header must fit into the first piece.
       {"HTTP/1.1 200 OK\r\nX-Long: " + std::string(3000, 'a') + "\r\nContent-Length: 1\r\n\r\nx",
-       VLHttpGet::HTTP_BAD_ANSWER},
-      {std::string(kNulInHeader, sizeof kNulInHeader - 1), VLHttpGet::HTTP_OK},
-      {"", VLHttpGet::HTTP_NOTHING_RECEIVED},
+       VL_WS_E_NETWORK},
+      {std::string(kNulInHeader, sizeof kNulInHeader - 1), VL_WS_OK},
+      {"", VL_WS_E_NETWORK},
   };
-  for (const auto& c : cases) EXPECT_EQ(c.result, Get(c.reply)) << c.reply;
+  for (const auto& c : cases) EXPECT_EQ(c.status, Get(c.reply)) << c.reply;
 }
 
 // TCP may deliver an answer in pieces anywhere, also within the header: it is read to the end
 // of the header, and a small body to its announced length.
 TEST_F(HttpGet, AnswersThatArriveInPiecesAreReadWhole) {
   m_Server.SetBehaviour(VLTestServer::kPieces);
-  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nLast-Modified: Mon, 03 Jan 2011 10:00:00 GMT\r\n"
-                                    "Content-Length: 25\r\n\r\n12/31/2010 11:59:59 PM ok"));
+  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\nLast-Modified: Mon, 03 Jan 2011 10:00:00 GMT\r\n"
+                          "Content-Length: 25\r\n\r\n12/31/2010 11:59:59 PM ok"));
   VLString value;
   EXPECT_TRUE(m_Get.Field("Last-Modified", &value));
   EXPECT_STREQ("Mon, 03 Jan 2011 10:00:00 GMT", value.c_str());
   ASSERT_TRUE(m_Get.ReceiveBody());
   EXPECT_EQ(25u, m_Get.BodyReceived());
   EXPECT_STREQ("12/31/2010 11:59:59 PM ok", m_Get.Body());
-  EXPECT_EQ(VLHttpGet::HTTP_NOT_FOUND, Get("HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n"));
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Get("HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n"));
 
   // A body that ends early, or does not fit beside the header, is not read whole.
-  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 30\r\n\r\nshort"));
+  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 30\r\n\r\nshort"));
   EXPECT_FALSE(m_Get.ReceiveBody());
-  ASSERT_EQ(VLHttpGet::HTTP_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 3000\r\n\r\nlong"));
+  ASSERT_EQ(VL_WS_OK, Get("HTTP/1.1 200 OK\r\nContent-Length: 3000\r\n\r\nlong"));
   EXPECT_FALSE(m_Get.ReceiveBody());
 }
 
 TEST_F(HttpGet, ConnectionFailures) {
-  EXPECT_EQ(VLHttpGet::HTTP_CONNECT_FAILED, Run(VLClosedPort()));
+  EXPECT_EQ(VL_WS_E_CONNECT, Run(VLClosedPort()));
   m_Server.SetBehaviour(VLTestServer::kCloseAtOnce);
-  EXPECT_NE(VLHttpGet::HTTP_OK, Run(m_Server.Port()));
+  EXPECT_EQ(VL_WS_E_NETWORK, Run(m_Server.Port()));
+}
+
+// The server time's request, which no other test sees whole (it makes a context of its own).
+TEST(ServerTime, AsksWithAHandBuiltGet) {
+  VLTestServer& service = VLStandInServer(VL_STORE_PRODUCTION_HOST, 80);
+  service.SetReply(VLTestServer::HttpReply("12/31/2010 11:59:59 PM", "200 OK"));
+  time_t now = 0;
+  ASSERT_EQ(VL_WS_OK, VL_WS_getServerTime(&now));
+  EXPECT_EQ(1293839999, now);
+  EXPECT_EQ("GET /device/time/ HTTP/1.1\r\nUser-Agent: DUDUVud\r\nHost: " VL_STORE_PRODUCTION_HOST "\r\n\r\n",
+            service.Requests().back());
 }
 
 TEST(HttpURL, SplitsHostPortAndPath) {

@@ -80,10 +80,9 @@ TEST_F(Bandwidth, AnAnnouncedMegabyteIsMeasuredOverItsFirst204800Bytes) {
   EXPECT_GT(bits, 0u);
   EXPECT_LE(bits, 204800u * 8000u);
   ASSERT_EQ(1u, m_Probe.Requests().size());
-  std::string request = m_Probe.Requests()[0];
-  EXPECT_EQ(0u, request.find("GET /speed/probe.bin HTTP/1.1\r\n"));
-  EXPECT_EQ("127.0.0.1:" + std::to_string(m_Probe.Port()), VLTestServer::Header(request, "Host"));
-  EXPECT_EQ("DUDUVud", VLTestServer::Header(request, "User-Agent"));
+  EXPECT_EQ("GET /speed/probe.bin HTTP/1.1\r\nHost: 127.0.0.1:" + std::to_string(m_Probe.Port()) +
+                "\r\nUser-Agent: DUDUVud\r\n\r\n",
+            m_Probe.Requests()[0]);
 
   EXPECT_EQ(VL_WS_E_NETWORK, Check(Canned(Answer(1000000, 204799)), &bits));
   EXPECT_EQ(0u, bits);
@@ -94,29 +93,14 @@ TEST_F(Bandwidth, AnAnnouncedMegabyteIsMeasuredOverItsFirst204800Bytes) {
   EXPECT_GE(bits, 8000u);
 }
 
+// The probe's own statuses; VLHttpGet's tests have every answer it refuses.
 TEST_F(Bandwidth, FailuresOfTheProbe) {
   Init();
-  struct {
-    std::string reply;
-    VL_WS_Status status;
-  } cases[] = {
-      {"HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n", VL_WS_E_HTTP_NOT_FOUND},
-      {"HTTP/1.1 503 Service Unavailable\r\nContent-Length: 1\r\n\r\nx", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\nContent-Length: 0\r\n\r\n", VL_WS_E_NETWORK},
-      {"HTTP/1.1 200 OK\r\n\r\nxyz", VL_WS_E_NETWORK},
-      {"", VL_WS_E_NETWORK},
-  };
   unsigned int bits = 0;
-  for (const auto& c : cases) {
-    EXPECT_EQ(c.status, Check(Canned(c.reply), &bits)) << c.reply;
-    EXPECT_EQ(0u, bits);
-  }
-  EXPECT_EQ(VL_WS_E_CONNECT, Check("http://127.0.0.1:" + std::to_string(VLClosedPort()) + "/probe", &bits));
-  for (const char* url : {"http://images.ostrel.example", "http://images.ostrel.example/", "images.ostrel.example/p",
-                          "http:///probe", "http://images.ostrel.example:http/probe"}) {
-    EXPECT_EQ(VL_WS_E_BANDWIDTH_BAD_URL, Check(url, &bits)) << url;
-    EXPECT_EQ(0u, bits);
-  }
+  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, Check(Canned("HTTP/1.1 404 Not Found\r\nContent-Length: 0\r\n\r\n"), &bits));
+  EXPECT_EQ(0u, bits);
+  EXPECT_EQ(VL_WS_E_BANDWIDTH_BAD_URL, Check("http://images.ostrel.example:http/probe", &bits));
+  EXPECT_EQ(0u, bits);
   VL_WS_Handle none = {};
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_checkBandwidth(&none, &bits));
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_checkBandwidth(&m_Handle, nullptr));
@@ -155,8 +139,6 @@ TEST_F(Bandwidth, TheProbeURLComesFromTheStoresConfigurationOnceAndPointsAtTheIm
   requests = Requests(1);
   ASSERT_EQ(1u, requests.size());
   EXPECT_EQ("bandwidth probe", requests[0].note);
-  Fault("/speedtest/=status:404,times=1");
-  EXPECT_EQ(VL_WS_E_HTTP_NOT_FOUND, VL_WS_checkBandwidth(&m_Handle, &bits));
 }
 
 TEST_F(Bandwidth, TheLastProbeKeyInAnyLetterCaseWins) {
@@ -203,9 +185,7 @@ TEST_F(Device, ServerTimeFailuresLeaveTheTimeUnknown) {
     const char* fault;
     VL_WS_Status status;
   } cases[] = {
-      {"/device/time/=status:503,times=1", VL_WS_E_NETWORK},
       {"/device/time/=status:404,times=1", VL_WS_E_NETWORK},
-      {"/device/time/=close,times=1", VL_WS_E_NETWORK},
       {"/device/time/=truncated,times=1", VL_WS_E_UNEXPECTED},  // "12/31/2010 " has three fields
       {"/device/time/=badlength:64,times=1", VL_WS_E_UNEXPECTED},
   };
