@@ -2,7 +2,8 @@
 // a context (as a gSOAP plug-in) it replaces the context's connection callbacks:
 //
 // - open: TCP to the URL's host and port, or to the HTTP proxy when one is set, after the lab
-//   override VLWS_CONNECT_TO (VLConnectTo); connect time-out = the context's connect_timeout.
+//   override VLWS_CONNECT_TO (VLConnectTo), over IPv4 or IPv6 (SetNextFamily may narrow one
+//   connection to one of them); connect time-out = the context's connect_timeout.
 //   For "https" URLs then a CONNECT tunnel through the proxy, and TLS with the context's TLS
 //   context: SNI and the certificate check use the URL's host, never the overridden address.
 //   The handshake is bounded by connect_timeout as well. It resumes the last TLS session of the
