@@ -46,8 +46,8 @@ class VLSimClientTest : public testing::Test {
   // The request log once it holds count requests (waiting up to 5 s): the simulator logs a
   // request after its answer went out, and the client may be done with the answer before.
   std::vector<VLSimRequest> Requests(size_t count);
-  // Empties the request log once the requests answered so far are in it (for the same reason, it
-  // waits until the log has been quiet for 200 ms).
+  // Empties the request log once the requests answered so far are in it: for the same reason, it
+  // gives them 200 ms to arrive first.
   void ClearRequests();
   void Fault(const std::string& spec);
 
