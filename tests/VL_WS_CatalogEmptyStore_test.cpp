@@ -39,9 +39,7 @@ TEST(EmptyStore, EmptyGenreTreeIsReturnedAndAskedForEveryTime) {
   setenv("SSL_CERT_FILE", sim.CAFile().c_str(), 1);
   setenv("VLWS_CONNECT_TO", sim.ConnectTo().c_str(), 1);
 
-  VL_WS_SetupParams params = VLTestSetupParams();
-  params.CacheType = 1;
-  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+  VL_WS_SetupParams params = VLTestSetupParams(1);
   VL_WS_Handle handle = {};
   ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&handle, &params));
   for (int round = 0; round < 2; ++round) {

@@ -174,23 +174,15 @@ class Catalog : public VLTestAccountClient {
  protected:
   void SetUp() override {
     VLTestAccountClient::SetUp();
-    ASSERT_EQ(VL_WS_OK, Init(MemoryCache(7)));
+    ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams(1)));
   }
 
-  // A setup record with an in-memory cache of the kinds in data.
-  static VL_WS_SetupParams MemoryCache(int data) {
-    VL_WS_SetupParams params = VLTestSetupParams();
-    params.CacheType = 1;
-    params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(data);
-    return params;
-  }
   // Makes m_Handle anew; the request log and the log lines then start empty.
   using VLTestAccountClient::Init;
   VL_WS_Status Init(const VL_WS_SetupParams& params) {
     VL_WS_release(&m_Handle);
     VL_WS_Status status = VL_WS_initialize(&m_Handle, &params);
-    if (params.CacheType != 0 && (params.CacheData & 1) != 0) m_Sim.WaitForRequests(1, 5000);  // the load time
-    m_Sim.ClearRequests();
+    ClearRequests();
     TakeLog();
     return status;
   }
@@ -213,11 +205,6 @@ class Catalog : public VLTestAccountClient {
   bool Cached(const char* name, const char* key) {
     VLString value;
     return Cache().ReadMetaData(name, key, value);
-  }
-  // The title's wishlist flag in the cache: -1 without one, else 0 or 1.
-  int Flag(int titleID) {
-    bool flag = false;
-    return Cache().ReadWishlistFlag(titleID, flag) ? flag : -1;
   }
 };
 
@@ -291,21 +278,11 @@ TEST_F(Catalog, UnreadableCachedAnswerIsAMissAndIsReplaced) {
 TEST_F(Catalog, AnswersAreKeptOnlyWhenCatalogueAnswersAreCached) {
   for (int data : {0, 2, 4, 6, -1}) {  // -1: no cache at all
     SCOPED_TRACE(data);
-    ASSERT_EQ(VL_WS_OK, Init(data < 0 ? VLTestSetupParams() : MemoryCache(data)));
+    ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams(data < 0 ? 0 : 1, data)));
     EXPECT_EQ(VL_WS_OK, FetchTitles());
     EXPECT_EQ(VL_WS_OK, FetchTitles());
     EXPECT_EQ(std::vector<std::string>(2, "getTitlesByNavigation"), Sent(2));
   }
-}
-
-TEST_F(Catalog, TitlesWithoutClientStateOrRecord) {
-  VL_WS_Handle empty = {};
-  VL_WS_TitlesResponse page;
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitles(&empty, 1, 1, 5, 2, &page));
-  ExpectEmptyAndRelease(page);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitles(nullptr, 1, 1, 5, 2, &page));
-  VL_WS_release(&page);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitles(&m_Handle, 1, 1, 5, 2, nullptr));
 }
 
 // The store answers page number and size in 16-bit fields: values beyond them never go out.
@@ -327,6 +304,11 @@ TEST_F(Catalog, PagesBeyondSixteenBitsAreRefusedBeforeAnyRequest) {
     };
     for (auto& call : calls) EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, call());
   }
+  VL_WS_Handle empty = {};
+  VL_WS_TitlesResponse page;
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitles(&empty, 1, 1, 5, 2, &page));
+  ExpectEmptyAndRelease(page);
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getTitles(&m_Handle, 1, 1, 5, 2, nullptr));
   EXPECT_TRUE(RequestsNow().empty());
   EXPECT_EQ(VL_WS_OK, FetchTitles(32767));
 }
@@ -632,6 +614,10 @@ TEST_F(Catalog, ShouldUpdateCacheAsksTheStoreAndLeavesTheCacheAlone) {
   EXPECT_EQ(VL_WS_OK, VL_WS_shouldUpdateCache(&m_Handle, "2001-01-01T00:00:00", &update));
   EXPECT_TRUE(update);
   EXPECT_TRUE(Cached("getTitles", "1,1,5,2"));
+  VLAnswer<VL_WS_String> time;  // the load time it compares is the store's text
+  ASSERT_EQ(VL_WS_OK, VL_WS_getLastCacheLoadTimeUTC(&m_Handle, time.Fresh()));
+  EXPECT_EQ(VL_WS_TAG_STRING, *time->tag);
+  EXPECT_EQ(m_Sim.Store().LastCacheLoadTime(), std::string(time->Text, time->Length));
 
   VL_WS_Handle empty = {};
   const struct {
@@ -644,13 +630,22 @@ TEST_F(Catalog, ShouldUpdateCacheAsksTheStoreAndLeavesTheCacheAlone) {
     EXPECT_FALSE(update);
   }
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_shouldUpdateCache(&m_Handle, "2001-01-01T00:00:00", nullptr));
-  EXPECT_EQ(std::vector<std::string>(2, "shouldUpdateCache"), Sent(2));
+  EXPECT_EQ((std::vector<std::string>{"shouldUpdateCache", "shouldUpdateCache", "getLastCacheLoadTimeUTC"}), Sent(3));
 }
 
-TEST_F(Catalog, UpdateLocalCacheDropsTheAnswersOnlyForANewCatalogue) {
+// Only the kinds given and cached are refreshed: box art is marked for revalidation, catalogue
+// answers go only for a new catalogue, user data always go.
+TEST_F(Catalog, UpdateLocalCacheRefreshesTheKindsGivenAndCached) {
   EXPECT_EQ(VL_WS_OK, FetchTitles());
   ASSERT_TRUE(Cache().WriteWishlistFlag(1001, true));
+  ASSERT_TRUE(Cache().WriteBoxArt("t1001_", VL_WS_BOXART_175, 5, "Mon", 0, ""));
   EXPECT_EQ(kOne, Sent(1));
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
+  unsigned int size = 0, needUpdate = 0;
+  VLString lastModified, data;
+  ASSERT_TRUE(Cache().ReadBoxArt("t1001_", VL_WS_BOXART_175, size, lastModified, needUpdate, data));
+  EXPECT_EQ(1u, needUpdate);
+  EXPECT_TRUE(RequestsNow().empty());
 
   // The same catalogue: the answers stay; user data are another kind.
   EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_METADATA));
@@ -658,37 +653,43 @@ TEST_F(Catalog, UpdateLocalCacheDropsTheAnswersOnlyForANewCatalogue) {
   EXPECT_TRUE(Cached("getTitles", "1,1,5,2"));
   EXPECT_EQ(1, Flag(1001));
 
-  // A new catalogue: they go, and the next page comes from the store.
+  // A new catalogue whose load time cannot be fetched changes nothing; once fetched, the answers
+  // go, and the next page comes from the store.
   const std::string loaded = m_Sim.Store().LastCacheLoadTime();
   m_Sim.Store().SetLastCacheLoadTime("2014-04-04T04:04:04");
+  Fault("getLastCacheLoadTimeUTC=status:503,times=1");
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_METADATA));
+  EXPECT_TRUE(Cached("getTitles", "1,1,5,2"));
   EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_METADATA));
   m_Sim.Store().SetLastCacheLoadTime(loaded);
   EXPECT_FALSE(Cached("getTitles", "1,1,5,2"));
   EXPECT_EQ(VL_WS_OK, FetchTitles());
-  EXPECT_EQ((std::vector<std::string>{"getLastCacheLoadTimeUTC", "getTitlesByNavigation"}), Sent(2));
+  EXPECT_EQ((std::vector<std::string>{"getLastCacheLoadTimeUTC", "getLastCacheLoadTimeUTC", "getTitlesByNavigation"}),
+            Sent(3));
 
   EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_USERDATA));
   EXPECT_EQ(-1, Flag(1001));
 
   // Box art on a handle that caches catalogue answers and user data only: nothing happens.
-  ASSERT_EQ(VL_WS_OK, Init(MemoryCache(5)));
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams(1, 5)));
   EXPECT_EQ(VL_WS_OK, FetchTitles());
   ASSERT_TRUE(Cache().WriteWishlistFlag(1001, true));
   EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
   EXPECT_TRUE(Cached("getTitles", "1,1,5,2"));
   EXPECT_EQ(1, Flag(1001));
-  VL_WS_GenreLabelResponse label;
-  VL_WS_getGenreLabel(&m_Handle, 10, &label);
-  VL_WS_release(&label);
-  EXPECT_EQ((std::vector<std::string>{"getTitlesByNavigation", "getGenreLabel"}), Sent(2));
+  EXPECT_EQ(kOne, Sent(1));
+
+  // Without a cache there is nothing to refresh.
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams()));
+  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, 7));
+  EXPECT_TRUE(RequestsNow().empty());
+  VL_WS_Handle empty = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_updateLocalCache(&empty, 7));
 }
 
 TEST_F(Catalog, FileCacheServesEveryHandleOfItsFile) {
   VLTestDir dir;
-  VL_WS_SetupParams params = MemoryCache(7);
-  params.CacheType = 2;
-  params.CachePath = dir.path().c_str();
-  ASSERT_EQ(VL_WS_OK, Init(params));
+  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams(2, 7, dir.path().c_str())));
   EXPECT_EQ(VL_WS_OK, FetchTitles());
   EXPECT_EQ(kOne, Sent(1));
 
@@ -710,10 +711,9 @@ TEST_F(Catalog, FileCacheServesEveryHandleOfItsFile) {
   VL_WS_release(&copy);
 }
 
-// Every operation once with a transport fault: its status, a tagged record holding nothing, and
-// nothing in the cache.
-TEST_F(Catalog, TransportFaultOfEveryOperationLeavesAnEmptyRecordAndNothingKept) {
-  const int ids[] = {10};
+// A transport fault in each shape of catalogue answer (they share one call sequence): its status,
+// a tagged record holding nothing, and nothing in the cache.
+TEST_F(Catalog, TransportFaultsLeaveAnEmptyRecordAndNothingKept) {
   VL_WS_Handle* h = &m_Handle;
   const struct {
     const char* operation;  // the SOAP operation
@@ -723,34 +723,11 @@ TEST_F(Catalog, TransportFaultOfEveryOperationLeavesAnEmptyRecordAndNothingKept)
   } cases[] = {
       {"getTitlesByNavigation", "getTitles", "1,1,5,2",
        EmptyAnswer<VL_WS_TitlesResponse>([&](auto* r) { return VL_WS_getTitles(h, 1, 1, 5, 2, r); })},
-      {"getNavigation", "getNavigation", "",
-       EmptyAnswer<VL_WS_GenreArray>([&](auto* r) { return VL_WS_getNavigation(h, r); })},
       {"getGenreLabel", nullptr, nullptr,
        EmptyAnswer<VL_WS_GenreLabelResponse>([&](auto* r) { return VL_WS_getGenreLabel(h, 10, r); })},
-      {"getTitlesByGenreArray", nullptr, nullptr,
-       EmptyAnswer<VL_WS_TitlesResponseArray>(
-           [&](auto* r) { return VL_WS_getTitlesByGenreIDs(h, 1, ids, 1, 5, 2, r); })},
-      {"getTitleListing", "getTitleListing", "1001",
-       EmptyAnswer<VL_WS_TitleListingResponse>([&](auto* r) { return VL_WS_getTitleListing(h, 1001, r); })},
-      {"getTvEpisodeListing", "getTvEpisodeListing", "50001",
-       EmptyAnswer<VL_WS_TitleListingResponse>([&](auto* r) { return VL_WS_getTvEpisodeListing(h, 50001, r); })},
-      {"getTvEpisodeListByTitleID", "getTvEpisodeListByTitleID", "1151",
-       EmptyAnswer<VL_WS_TvEpisodeListResponse>([&](auto* r) { return VL_WS_getTvEpisodeListByTitleID(h, 1151, r); })},
       {"getAllTvEpisodeListings", "getAllTvEpisodeListings", "1151",
        EmptyAnswer<VL_WS_TitleListingResponseArray>(
            [&](auto* r) { return VL_WS_getAllTvEpisodeListings(h, 1151, r); })},
-      {"translateTivoExternalId", "translateTivoExternalId", "tivo:ts.307007",
-       EmptyAnswer<VL_WS_TranslateTivoExternalIDResponse>(
-           [&](auto* r) { return VL_WS_translateTivoExternalID(h, "tivo:ts.307007", r); })},
-      {"translateSkuId", "translateSkuId", "10021",
-       EmptyAnswer<VL_WS_TranslateSkuIDResponse>([&](auto* r) { return VL_WS_translateSkuID(h, 10021, r); })},
-      {"searchForTitle", "searchForTitle", "1,5,2,0,harbor",
-       EmptyAnswer<VL_WS_TitlesResponse>([&](auto* r) { return VL_WS_searchForTitle(h, 1, 5, 2, 0, "harbor", r); })},
-      {"searchForTitleDetail", "searchForTitleDetail", "1,5,2,0,harbor",
-       EmptyAnswer<VL_WS_TitlesResponse>(
-           [&](auto* r) { return VL_WS_searchForTitleDetail(h, 1, 5, 2, 0, "harbor", r); })},
-      {"getRecommendedTitles", "getRecommendedTitles", "1001",
-       EmptyAnswer<VL_WS_RecommendedTitlesResponse>([&](auto* r) { return VL_WS_getRecommendedTitles(h, 1001, r); })},
       {"shouldUpdateCache", nullptr, nullptr,
        [&] {
          bool update = true;

@@ -37,97 +37,70 @@ class Client : public VLSimClientTest {
     return VL_WS_initialize(&m_Handle, &params);
   }
   VL_WS_SetupParams2& Settings() { return m_Handle.client->m_Params; }
-  // The requests of the log (once it holds count) whose path starts with path.
-  std::vector<VLSimRequest> RequestsTo(const std::string& path, size_t count) {
-    std::vector<VLSimRequest> found;
-    for (const VLSimRequest& r : Requests(count))
-      if (r.path.compare(0, path.size(), path) == 0) found.push_back(r);
-    return found;
-  }
   // A setup record with a file cache of all kinds in folder.
-  static VL_WS_SetupParams FileCache(const std::string& folder) {
-    VL_WS_SetupParams params = VLTestSetupParams();
-    params.CacheType = 2;
-    params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
-    params.CachePath = folder.c_str();
-    return params;
-  }
+  static VL_WS_SetupParams FileCache(const std::string& folder) { return VLTestSetupParams(2, 7, folder.c_str()); }
   static bool IsEmpty(const VL_WS_Handle& handle) { return handle.tag == nullptr && handle.client == nullptr; }
   // The service the handle sends account operations to.
   static soap* Routing(const VL_WS_Handle& handle) { return &static_cast<soap&>(handle.client->m_StreamDownloadAPI); }
 };
 
-TEST_F(Client, FixedEnvironmentsTakeTheirEndpointWithoutAsking) {
+// A fixed environment takes its endpoint without asking; the default one (and any number from 3)
+// is the digit the device-environment service answers.
+TEST_F(Client, EnvironmentsChooseTheEndpoint) {
   struct {
     enum VL_WS_SetupParams::ContentType content;
-    VL_WS_EnvNum env;
+    int env;    // given
+    int digit;  // what the store answers, -1 for a fixed environment
     const char* host;
     const char* path;
   } cases[] = {
-      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_STGAPI, "stgapi.ostrel.example", "/api/"},
-      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_STG, "stg.ostrel.example", "/api/"},
-      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_PRODUCTION, "store.ostrel.example", "/api/"},
-      {VL_WS_SetupParams::ADULT, VL_WS_ENV_STGAPI, "stgapi.ostrel.example", "/aac/api/"},
-      {VL_WS_SetupParams::ADULT, VL_WS_ENV_STG, "stg.adult.ostrel.example", "/api/"},
-      {VL_WS_SetupParams::ADULT, VL_WS_ENV_PRODUCTION, "adult.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_STGAPI, -1, "stgapi.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_STG, -1, "stg.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_PRODUCTION, -1, "store.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_STGAPI, -1, "stgapi.ostrel.example", "/aac/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_STG, -1, "stg.adult.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_PRODUCTION, -1, "adult.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_DEFAULT, 0, "stgapi.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::GENERAL, VL_WS_ENV_DEFAULT, 1, "stg.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::GENERAL, 9, 7, "store.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_DEFAULT, 0, "stgapi.ostrel.example", "/aac/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_DEFAULT, 1, "stg.adult.ostrel.example", "/api/"},
+      {VL_WS_SetupParams::ADULT, VL_WS_ENV_DEFAULT, 2, "adult.ostrel.example", "/api/"},
   };
   for (const auto& c : cases) {
-    SCOPED_TRACE(std::string(c.host) + c.path);
-    m_Sim.ClearRequests();
+    SCOPED_TRACE(std::string(c.host) + c.path + " " + std::to_string(c.digit));
+    ClearRequests();
+    if (c.digit >= 0) m_Sim.Store().SetDeviceEnv(kDevice, c.digit);
     VL_WS_SetupParams params = VLTestSetupParams();
     params.ContentType = c.content;
-    params.EnvNum = c.env;
+    params.EnvNum = static_cast<VL_WS_EnvNum>(c.env);
     params.AccessType = UNKNOWN;  // the file type question shows where requests go
     testing::internal::CaptureStdout();
     ASSERT_EQ(VL_WS_OK, Init(params));
     std::string printed = testing::internal::GetCapturedStdout();
     std::string base = std::string("https://") + c.host + c.path;
     EXPECT_EQ(base, Settings().ServiceBaseURL.c_str());
-    EXPECT_EQ("\n=======>Content type:" + std::to_string(c.content) + ", envID:" + std::to_string(c.env) +
-                  ", endpoint URL:" + base + "\n",
-              printed);
     VL_WS_EnvID env = -1;
     EXPECT_EQ(VL_WS_OK, VL_WS_getDeviceEnv(&m_Handle, &env));
-    EXPECT_EQ(c.env, env);
-    std::vector<VLSimRequest> requests = Requests(1);
-    ASSERT_EQ(1u, requests.size());
-    EXPECT_EQ("getFileType", requests[0].operation);
-    EXPECT_EQ(c.host, requests[0].host);
-    EXPECT_EQ(std::string(c.path) + "RealTimeBrowse.asmx", requests[0].path);
-  }
-}
-
-TEST_F(Client, DefaultEnvironmentIsTheDigitTheDeviceEnvironmentServiceAnswers) {
-  struct {
-    enum VL_WS_SetupParams::ContentType content;
-    int digit;
-    const char* base;
-  } cases[] = {
-      {VL_WS_SetupParams::GENERAL, 0, "https://stgapi.ostrel.example/api/"},
-      {VL_WS_SetupParams::GENERAL, 1, "https://stg.ostrel.example/api/"},
-      {VL_WS_SetupParams::GENERAL, 7, "https://store.ostrel.example/api/"},
-      {VL_WS_SetupParams::ADULT, 0, "https://stgapi.ostrel.example/aac/api/"},
-      {VL_WS_SetupParams::ADULT, 1, "https://stg.adult.ostrel.example/api/"},
-      {VL_WS_SetupParams::ADULT, 2, "https://adult.ostrel.example/api/"},
-  };
-  for (const auto& c : cases) {
-    SCOPED_TRACE(c.base);
-    m_Sim.ClearRequests();
-    m_Sim.Store().SetDeviceEnv(kDevice, c.digit);
-    VL_WS_SetupParams params = VLTestSetupParams();
-    params.ContentType = c.content;
-    params.EnvNum = c.digit == 7 ? static_cast<VL_WS_EnvNum>(9) : VL_WS_ENV_DEFAULT;  // 3 and above ask
-    testing::internal::CaptureStdout();
-    ASSERT_EQ(VL_WS_OK, Init(params));
-    EXPECT_EQ(std::string("\n---> End-Point URL: ") + c.base + " <---\n\n", testing::internal::GetCapturedStdout());
-    EXPECT_EQ(c.base, Settings().ServiceBaseURL);
-    EXPECT_EQ(c.digit, Settings().EnvID);
-    std::vector<VLSimRequest> asked = RequestsTo("/device/env/", 1);
-    ASSERT_EQ(1u, asked.size());
-    EXPECT_TRUE(asked[0].tls);
-    EXPECT_EQ("store.ostrel.example", asked[0].host);
-    EXPECT_EQ("d=00-11-22-33-44-55&dt=7", asked[0].query);
-    EXPECT_EQ("DUDUVud", asked[0].userAgent);
+    std::vector<VLSimRequest> requests = Requests(c.digit >= 0 ? 2 : 1);
+    ASSERT_EQ(c.digit >= 0 ? 2u : 1u, requests.size());
+    if (c.digit >= 0) {
+      EXPECT_EQ("\n---> End-Point URL: " + base + " <---\n\n", printed.substr(0, printed.find("\n=======>")));
+      EXPECT_EQ(c.digit, env);
+      EXPECT_TRUE(requests[0].tls);
+      EXPECT_EQ("store.ostrel.example", requests[0].host);
+      EXPECT_EQ("/device/env/", requests[0].path.substr(0, 12));
+      EXPECT_EQ("d=00-11-22-33-44-55&dt=7", requests[0].query);
+      EXPECT_EQ("DUDUVud", requests[0].userAgent);
+    } else {
+      EXPECT_EQ("\n=======>Content type:" + std::to_string(c.content) + ", envID:" + std::to_string(c.env) +
+                    ", endpoint URL:" + base + "\n",
+                printed);
+      EXPECT_EQ(c.env, env);
+    }
+    EXPECT_EQ("getFileType", requests.back().operation);
+    EXPECT_EQ(c.host, requests.back().host);
+    EXPECT_EQ(std::string(c.path) + "RealTimeBrowse.asmx", requests.back().path);
   }
 }
 
@@ -207,6 +180,21 @@ TEST_F(Client, InvalidSetupIsRefusedBeforeAnythingElse) {
   VL_WS_SetupParams params = VLTestSetupParams();
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_initialize(nullptr, &params));
   EXPECT_TRUE(m_Sim.Requests().empty());
+
+  // The edges that are taken: the limit is checked only with a cache; the longest device name.
+  params.CacheLimit = 1;
+  EXPECT_EQ(VL_WS_OK, Init(params));
+  params.CacheType = 1;
+  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+  for (int limit : {358400, 0}) {
+    params.CacheLimit = limit;
+    EXPECT_EQ(VL_WS_OK, Init(params));
+  }
+  std::string longestId(350, 'x');
+  params.DestinationUniqueID = longestId.c_str();
+  EXPECT_EQ(VL_WS_OK, Init(params));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getVersion(nullptr));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getAvailableEnvLists(nullptr));
 }
 
 TEST_F(Client, CacheFolderComesBeforeTheEnvironmentServiceAndTheCache) {
@@ -225,21 +213,6 @@ TEST_F(Client, CacheFolderComesBeforeTheEnvironmentServiceAndTheCache) {
   params.CachePath = nested.c_str();
   EXPECT_EQ(VL_WS_E_CONNECT, Init(params));  // the fault is still there
   EXPECT_TRUE(VLFile::FolderExist(nested.c_str()));
-  EXPECT_EQ(VL_WS_OK, Init(params));
-}
-
-TEST_F(Client, CacheLimitIsCheckedOnlyWithACache) {
-  VL_WS_SetupParams params = VLTestSetupParams();
-  params.CacheLimit = 1;
-  EXPECT_EQ(VL_WS_OK, Init(params));
-  params.CacheType = 1;
-  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
-  params.CacheLimit = 358400;
-  EXPECT_EQ(VL_WS_OK, Init(params));
-  params.CacheLimit = 0;
-  EXPECT_EQ(VL_WS_OK, Init(params));
-  std::string longestId(350, 'x');
-  params.DestinationUniqueID = longestId.c_str();
   EXPECT_EQ(VL_WS_OK, Init(params));
 }
 
@@ -288,7 +261,7 @@ TEST_F(Client, UserAgentTellsFirmwareRevisionAndModel) {
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(c.userAgent);
-    m_Sim.ClearRequests();
+    ClearRequests();
     VL_WS_SetupParams params = VLTestSetupParams();
     params.firmwareVersion = c.firmware;
     params.ApplicationRevision = c.revision;
@@ -333,7 +306,7 @@ TEST_F(Client, UnknownAccessTypeIsAskedOfTheStore) {
   EXPECT_EQ(static_cast<soap*>(&m_Handle.client->m_StreamAPI), Routing(m_Handle));
 
   // A given access type is kept without asking.
-  m_Sim.ClearRequests();
+  ClearRequests();
   params.AccessType = DOWNLOAD;
   m_Sim.Store().SetAccessType(STREAM);
   ASSERT_EQ(VL_WS_OK, Init(params));
@@ -441,8 +414,8 @@ TEST_F(Client, InitialisationRefreshesMetadataAndPurgesUserData) {
   VL_WS_SetupParams params = FileCache(dir.path());
   const std::string loaded = m_Sim.Store().LastCacheLoadTime();
   ASSERT_EQ(VL_WS_OK, Init(params));
-  ASSERT_EQ(1u, RequestsTo("/api/RealTimeBrowse.asmx", 1).size());
-  EXPECT_EQ("getLastCacheLoadTimeUTC", Requests(1).back().operation);
+  ASSERT_EQ(1u, Requests(1).size());
+  EXPECT_EQ("getLastCacheLoadTimeUTC", Requests(1)[0].operation);
   CacheInterface* cache = m_Handle.client->m_Cache;
   ASSERT_TRUE(cache->WriteMetaData("getNavigation", "", "answer"));
   ASSERT_TRUE(cache->WriteWishlistFlag(1001, true));
@@ -462,50 +435,6 @@ TEST_F(Client, InitialisationRefreshesMetadataAndPurgesUserData) {
   EXPECT_FALSE(m_Handle.client->m_Cache->ReadMetaData("getNavigation", "", value));
 }
 
-// The catalogue tests have what a new catalogue and the user-data bit do.
-TEST_F(Client, UpdateLocalCacheRefreshesTheKindsGivenAndCached) {
-  VLTestDir dir;
-  ASSERT_EQ(VL_WS_OK, Init(FileCache(dir.path())));
-  CacheInterface* cache = m_Handle.client->m_Cache;
-  ASSERT_TRUE(cache->WriteMetaData("getNavigation", "", "answer"));
-  ASSERT_TRUE(cache->WriteBoxArt("t1001_", VL_WS_BOXART_175, 5, "Mon", 0, ""));
-  ASSERT_TRUE(cache->WriteWishlistFlag(1001, true));
-  m_Sim.ClearRequests();
-
-  unsigned int size = 0, needUpdate = 0;
-  VLString lastModified, data, value;
-  bool flag = false;
-  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_BOXART));
-  ASSERT_TRUE(cache->ReadBoxArt("t1001_", VL_WS_BOXART_175, size, lastModified, needUpdate, data));
-  EXPECT_EQ(1u, needUpdate);
-  EXPECT_TRUE(cache->ReadMetaData("getNavigation", "", value));
-  EXPECT_TRUE(cache->ReadWishlistFlag(1001, flag));
-  EXPECT_TRUE(m_Sim.Requests().empty());
-
-  // Metadata: a load time that cannot be fetched changes nothing, even when the catalogue is new.
-  const std::string loaded = m_Sim.Store().LastCacheLoadTime();
-  m_Sim.Store().SetLastCacheLoadTime("2013-03-03T03:03:03");
-  Fault("getLastCacheLoadTimeUTC=status:503,times=1");
-  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, VL_WS_CacheParam::CACHE_METADATA));
-  m_Sim.Store().SetLastCacheLoadTime(loaded);
-  EXPECT_TRUE(cache->ReadMetaData("getNavigation", "", value));
-
-  // Without a cache there is nothing to refresh.
-  ASSERT_EQ(VL_WS_OK, Init(VLTestSetupParams()));
-  m_Sim.ClearRequests();
-  EXPECT_EQ(VL_WS_OK, VL_WS_updateLocalCache(&m_Handle, 7));
-  EXPECT_TRUE(m_Sim.Requests().empty());
-  VL_WS_Handle empty = {};
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_updateLocalCache(&empty, 7));
-
-  // The load time it compares is the store's text.
-  VL_WS_String time;
-  ASSERT_EQ(VL_WS_OK, VL_WS_getLastCacheLoadTimeUTC(&m_Handle, &time));
-  EXPECT_EQ(VL_WS_TAG_STRING, *time.tag);
-  EXPECT_EQ(m_Sim.Store().LastCacheLoadTime(), std::string(time.Text, time.Length));
-  VL_WS_release(&time);
-}
-
 TEST_F(Client, DuplicateHasItsOwnConnectionsAndCacheConnectionAndOutlivesItsSource) {
   VLTestDir dir;
   VL_WS_SetupParams params = FileCache(dir.path());
@@ -515,7 +444,7 @@ TEST_F(Client, DuplicateHasItsOwnConnectionsAndCacheConnectionAndOutlivesItsSour
   m_Sim.Store().SetAccessType(DOWNLOAD);
   ASSERT_EQ(VL_WS_OK, Init(params));
   ASSERT_TRUE(m_Handle.client->m_Cache->WriteMetaData("getNavigation", "", "answer"));
-  m_Sim.ClearRequests();
+  ClearRequests();
 
   VL_WS_Handle copy = {};
   ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));
@@ -545,46 +474,35 @@ TEST_F(Client, DuplicateHasItsOwnConnectionsAndCacheConnectionAndOutlivesItsSour
   EXPECT_TRUE(IsEmpty(copy));
 }
 
-TEST_F(Client, DuplicateOfAMemoryCacheHandleHasNoCacheAndReleasedHandlesAreEmpty) {
-  VL_WS_SetupParams params = VLTestSetupParams();
-  params.CacheType = 1;
-  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(7);
+// A duplicate of a memory cache handle has no cache; a live handle is never made anew, and a
+// released one is empty.
+TEST_F(Client, DuplicateOfAMemoryCacheHandleAndHandlesThatAreRefused) {
+  VL_WS_SetupParams params = VLTestSetupParams(1);
   ASSERT_EQ(VL_WS_OK, Init(params));
   VL_WS_Handle copy = {};
   ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));
   EXPECT_NE(nullptr, m_Handle.client->m_Cache);
   EXPECT_EQ(nullptr, copy.client->m_Cache);
-  VL_WS_release(&copy);
 
-  // Without a source there is nothing to copy; the caller releases the copy.
-  VL_WS_Handle empty = {};
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&copy, &empty));
-  EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&m_Handle, &m_Handle));
-  EXPECT_NE(nullptr, m_Handle.client);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(nullptr, &m_Handle));
-
-  // A released handle is empty, and releasing it again does nothing.
-  EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
-  EXPECT_TRUE(IsEmpty(m_Handle));
-  EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
-}
-
-TEST_F(Client, ALiveHandleIsNeverMadeAnew) {
-  VL_WS_SetupParams params = VLTestSetupParams();
-  ASSERT_EQ(VL_WS_OK, Init(params));
-  VL_WS_Handle copy = {};
-  ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));
   const VL_WS_Handle before = m_Handle, copyBefore = copy;
-
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_initialize(&m_Handle, &params));
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&copy, &m_Handle));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&m_Handle, &m_Handle));
   EXPECT_EQ(before.tag, m_Handle.tag);
   EXPECT_EQ(before.client, m_Handle.client);
   EXPECT_EQ(copyBefore.client, copy.client);
   VL_WS_EnvID env;
   EXPECT_EQ(VL_WS_OK, VL_WS_getDeviceEnv(&m_Handle, &env));
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
+
+  // Without a source there is nothing to copy; the caller releases the copy.
+  VL_WS_Handle empty = {};
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(&copy, &empty));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&copy));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_duplicate(nullptr, &m_Handle));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
+  EXPECT_TRUE(IsEmpty(m_Handle));
+  EXPECT_EQ(VL_WS_OK, VL_WS_release(&m_Handle));
 }
 
 // Every call has its own connection; all but the first to a host resume the TLS session of the
@@ -616,27 +534,6 @@ TEST_F(Client, TlsSessionsAreResumedAndTheCertificateIsStillChecked) {
   EXPECT_FALSE(log[3].resumed) << "a failed handshake forgets the session";
   EXPECT_TRUE(log[4].resumed);
   VL_WS_release(&duplicate);
-}
-
-TEST(ClientInterface, VersionAndEnvironmentList) {
-  VL_WS_Version version;
-  ASSERT_EQ(VL_WS_OK, VL_WS_getVersion(&version));
-  EXPECT_EQ(VL_WS_TAG_VERSION, *version.tag);
-  EXPECT_EQ(1, version.Major);
-  EXPECT_EQ(3, version.Minor);
-  EXPECT_EQ(1, version.Revision);
-  EXPECT_EQ(VL_WS_OK, VL_WS_release(&version));
-
-  VL_WS_EnvList list;
-  ASSERT_EQ(VL_WS_OK, VL_WS_getAvailableEnvLists(&list));
-  ASSERT_EQ(4, list.Count);
-  const char* names[] = {"stgapi", "stg", "production", "default"};
-  for (int i = 0; i < list.Count; ++i) {
-    EXPECT_EQ(i, list.Entries[i].EnvNum);
-    EXPECT_STREQ(names[i], list.Entries[i].Name);
-  }
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getVersion(nullptr));
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getAvailableEnvLists(nullptr));
 }
 
 }  // namespace

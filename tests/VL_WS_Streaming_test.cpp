@@ -1,6 +1,7 @@
 // Streaming operations against the store simulator: stream locations and instance reports of a
 // purchased title, bonus assets, THX settings, the default audio profile, and the statuses of
-// refused answers. Whatever the handle's access type, they go to the streaming service.
+// refused answers. Whatever the handle's access type (a download handle here), they go to the
+// streaming service.
 #include <gtest/gtest.h>
 
 #include <string>
@@ -23,6 +24,15 @@ class Streaming : public VLTestAccountClient {
     m_Sim.Store().SetAudioDefault(Account(), kDolbyPlus51);
     VLTestAccountClient::TearDown();
   }
+  // Whatever the handle's access type, every request went to the streaming service.
+  void ExpectStreamingServiceOnly(size_t count) {
+    std::vector<VLSimRequest> requests = Requests(count);
+    ASSERT_EQ(count, requests.size());
+    for (const VLSimRequest& request : requests) {
+      EXPECT_EQ("StreamAPI", request.service) << request.operation;
+      EXPECT_EQ("VL1:StreamDeviceRequestSettings", request.settingsElement) << request.operation;
+    }
+  }
   // A pass of the account for sku, bought in the store directly.
   int Pass(int sku) {
     VLSimPurchase purchase = m_Sim.Store().Purchase(Account(), sku, "192.0.2.17", false);
@@ -32,7 +42,7 @@ class Streaming : public VLTestAccountClient {
 };
 
 TEST_F(Streaming, LocationOfAPassAndReportsOfItsInstance) {
-  Init();
+  Init(DOWNLOAD);
   const int pass = Pass(10022);
   VLAnswer<VL_WS_StreamingAssetLocationResponse> location;
   ASSERT_EQ(VL_WS_OK, VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, location.Fresh()));
@@ -61,6 +71,7 @@ TEST_F(Streaming, LocationOfAPassAndReportsOfItsInstance) {
   ASSERT_EQ(VL_WS_OK, VL_WS_getStreamingBonusAssetLocation(&m_Handle, kBonusTrailer, location.Fresh()));
   EXPECT_EQ(kBonusTrailer, location->AssetID);
   EXPECT_TRUE(TakeLog().empty());
+  ExpectStreamingServiceOnly(4);
 }
 
 TEST_F(Streaming, EmptyStreamIDIsRefusedWithoutARequest) {
@@ -77,7 +88,7 @@ TEST_F(Streaming, EmptyStreamIDIsRefusedWithoutARequest) {
 }
 
 TEST_F(Streaming, RefusalFoldsIntoTheStatusOfLocationsNotOfTHX) {
-  Init();
+  Init(DOWNLOAD);
   const int pass = Pass(10021);  // rented for 48 hours
   m_Sim.Store().AdvanceClock(49 * 3600);
   VLAnswer<VL_WS_StreamingAssetLocationResponse> location;
@@ -106,10 +117,11 @@ TEST_F(Streaming, RefusalFoldsIntoTheStatusOfLocationsNotOfTHX) {
   Fault("getStreamingAssetLocation=soapfault");
   EXPECT_EQ(VL_WS_E_SOAP_FAULT(2), VL_WS_getStreamingAssetLocation(&m_Handle, pass, kStandard, location.Fresh()));
   EXPECT_EQ(nullptr, location->StreamingAssetLocation);
+  ExpectStreamingServiceOnly(6);
 }
 
 TEST_F(Streaming, DefaultAudioProfile) {
-  Init();
+  Init(DOWNLOAD);
   ASSERT_EQ(VL_WS_OK, Call(VL_WS_setAudioDefaultProperty, kStereo));
   int profile = -1;
   ASSERT_EQ(VL_WS_OK, VL_WS_getAudioDefaultProperty(&m_Handle, &profile));
@@ -122,25 +134,7 @@ TEST_F(Streaming, DefaultAudioProfile) {
                                       "VL_WS_getAudioDefaultProperty, ret:0,audioprofile:0",
                                       "VL_WS_setAudioDefaultProperty, ret:0,responseCode:4"}),
             TakeLog());
-}
-
-TEST_F(Streaming, AlwaysTheStreamingServiceWhateverTheAccessType) {
-  Init(DOWNLOAD);
-  const int pass = Pass(10022);
-  Call(VL_WS_getStreamingAssetLocation, pass, kStandard);
-  Call(VL_WS_getStreamingBonusAssetLocation, kBonusTrailer);
-  Call(VL_WS_loadLastStreamingAssetLocation, pass, kStandard);
-  Call(VL_WS_manageStreamingInstanceStatus, "STREAM-X", kPaused, 0);
-  Call(VL_WS_getTHXMediaDirector, pass, kStandard, kStereo);
-  Call(VL_WS_getTHXMediaDirectorBonusAsset, kBonusTrailer, kStandard, 0);
-  Call(VL_WS_setAudioDefaultProperty, kDolbyPlus51);
-  Call(VL_WS_getAudioDefaultProperty);
-  std::vector<VLSimRequest> requests = Requests(8);
-  ASSERT_EQ(8u, requests.size());
-  for (const VLSimRequest& request : requests) {
-    EXPECT_EQ("StreamAPI", request.service) << request.operation;
-    EXPECT_EQ("VL1:StreamDeviceRequestSettings", request.settingsElement) << request.operation;
-  }
+  ExpectStreamingServiceOnly(3);
 }
 
 }  // namespace

@@ -16,12 +16,6 @@ class Wishlist : public VLTestAccountClient {
   void AddToStore(int first, int last) {
     for (int title = first; title <= last; ++title) ASSERT_EQ(0, m_Sim.Store().WishlistAdd(Account(), title));
   }
-  // The title's flag in the cache: -1 without one, else 0 or 1.
-  int Flag(int titleID) {
-    bool flag = false;
-    if (!Cache().ReadWishlistFlag(titleID, flag)) return -1;
-    return flag ? 1 : 0;
-  }
   // The answer of VL_WS_checkTitleInWishlist, which must succeed.
   bool InWishlist(int titleID) {
     bool inWishlist = false;
@@ -118,7 +112,7 @@ TEST_F(Wishlist, ScanReadsPagesUntilEveryTitleIsFound) {
   EXPECT_EQ(std::vector<std::string>{"VL_WS_checkTitlesInWishlist, ret:0"}, TakeLog());
 
   // All of them on page 1: page 2 is not asked for.
-  m_Sim.ClearRequests();
+  ClearRequests();
   EXPECT_EQ((std::vector<bool>{true, true, true}), Scan({1011, 1060, 1011}));
   EXPECT_EQ(1u, Requests(1).size());
 }
@@ -132,7 +126,7 @@ TEST_F(Wishlist, UnfinishedScanKeepsNoFlags) {
 
   // A refused page (a token the store does not know) ends the scan as well.
   Settings().AuthToken = "SIMTOKEN-UNKNOWN";
-  m_Sim.ClearRequests();
+  ClearRequests();
   EXPECT_EQ((std::vector<bool>{false, false}), Scan({1002, 1100}));
   EXPECT_EQ(1u, Requests(1).size());
   EXPECT_EQ(-1, Flag(1002));

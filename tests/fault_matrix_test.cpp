@@ -202,19 +202,7 @@ class FaultMatrix : public testing::Test {
   // A handle with a file cache of every kind, authorised for an account, its probe URL known,
   // the store's environment for the device staging (1), so that an answer read tells.
   void SetUp() override {
-    VLSimOptions defaults;
-    VL_WS_SetupParams params = {};
-    params.APIKey = defaults.apiKey.c_str();
-    params.DestinationUniqueID = "00-11-22-33-44-55";
-    params.DestinationTypeID = 7;
-    params.UserName = defaults.userName.c_str();
-    params.Password = defaults.password.c_str();
-    params.EnvNum = VL_WS_ENV_PRODUCTION;
-    params.AccessType = STREAM;
-    params.CacheType = 2;
-    params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(
-        VL_WS_CacheParam::CACHE_METADATA | VL_WS_CacheParam::CACHE_BOXART | VL_WS_CacheParam::CACHE_USERDATA);
-    params.CachePath = m_Dir.path().c_str();
+    VL_WS_SetupParams params = VLTestSetupParams(2, 7, m_Dir.path().c_str());
     ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
     ASSERT_EQ(VL_WS_OK, VLReleasedCall<VL_WS_AuthorizeDeviceResponse>(VL_WS_TAG_AUTHORIZE_DEVICE_RESPONSE,
                                                                        VL_WS_authorizeDevice, &m_Handle, 1234));

@@ -164,7 +164,7 @@ class Soak : public VLSimClientTest {
     for (int t = 0; t < kThreads; ++t) threads.emplace_back(&Soak::Run, this, &handles[t], &randoms[t]);
     for (std::thread& thread : threads) thread.join();
     m_Sim.ClearFaults();
-    m_Sim.ClearRequests();
+    ClearRequests();
 #if defined(__SANITIZE_ADDRESS__)
     return __sanitizer_get_current_allocated_bytes();
 #else
@@ -178,11 +178,7 @@ class Soak : public VLSimClientTest {
 
 TEST_F(Soak, HandlesOnOneCacheFileUnderRandomFaults) {
   VLTestDir dir;
-  VL_WS_SetupParams params = VLTestSetupParams();
-  params.CacheType = 2;
-  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(
-      VL_WS_CacheParam::CACHE_METADATA | VL_WS_CacheParam::CACHE_BOXART | VL_WS_CacheParam::CACHE_USERDATA);
-  params.CachePath = dir.path().c_str();
+  VL_WS_SetupParams params = VLTestSetupParams(2, 7, dir.path().c_str());
   std::vector<VL_WS_Handle> handles(kThreads);
   ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&handles[0], &params));
   ASSERT_EQ(VL_WS_OK,

@@ -199,8 +199,3 @@ std::string VLSimSoapExchange::FaultString() {
   const char* text = m_Soap ? soap_fault_string(m_Soap) : nullptr;
   return text ? text : "";
 }
-
-std::string VLSimSoapExchange::FaultDetail() {
-  const char* text = m_Soap ? soap_fault_detail(m_Soap) : nullptr;
-  return text ? text : "";
-}

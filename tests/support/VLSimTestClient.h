@@ -67,7 +67,6 @@ class VLSimSoapExchange {
           Response* response);
   // The fault string of a SOAP fault answer, or "".
   std::string FaultString();
-  std::string FaultDetail();
 
   VLSimTestReply reply;
 

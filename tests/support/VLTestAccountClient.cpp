@@ -26,17 +26,11 @@ void VLTestAccountClient::Init(VL_WS_AccessType accessType, int cacheData) {
   std::string token;
   int account = 0;
   ASSERT_EQ(0, m_Sim.Store().Authorize(kPin, "00-11-22-33-44-55", 7, &token, &account));
-  VL_WS_SetupParams params = VLTestSetupParams();
+  VL_WS_SetupParams params = VLTestSetupParams(cacheData != 0 ? 1 : 0, cacheData);
   params.AuthToken = token.c_str();
   params.AccessType = accessType;
-  if (cacheData != 0) {
-    params.CacheType = 1;
-    params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(cacheData);
-  }
   ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
-  // A cache of service answers asks for the catalogue's load time first.
-  m_Sim.WaitForRequests(cacheData & VL_WS_CacheParam::CACHE_METADATA ? 1 : 0, 5000);
-  m_Sim.ClearRequests();
+  ClearRequests();
   m_Log.clear();
 }
 

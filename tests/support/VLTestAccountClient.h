@@ -47,11 +47,17 @@ class VLTestAccountClient : public VLSimClientTest {
 
   // Makes m_Handle (released first) with the test setup, the account's token from the store,
   // the access type, and a memory cache of the given kinds (none for 0), then clears the request
-  // log so that it shows the operations under test only.
+  // log (the catalogue's load time a cache of service answers asks for included) so that it shows
+  // the operations under test only.
   void Init(VL_WS_AccessType accessType = STREAM, int cacheData = 0);
   int Account() const { return m_Account; }
   VL_WS_SetupParams2& Settings() { return m_Handle.client->m_Params; }
   CacheInterface& Cache() { return *m_Handle.client->m_Cache; }
+  // The title's wishlist flag in the cache: -1 without one, else 0 or 1.
+  int Flag(int titleID) {
+    bool flag = false;
+    return Cache().ReadWishlistFlag(titleID, flag) ? flag : -1;
+  }
 
   // Calls an operation on m_Handle whose last parameter is the record (or value) it fills, and
   // gives the record back: for calls whose effect shows in the status, the store, the request log

@@ -1,5 +1,6 @@
 #include "VLTestSimulator.h"
 
+#include <stdint.h>
 #include <stdio.h>
 #include <stdlib.h>
 
@@ -21,7 +22,7 @@ VLSimServer& VLTestSimulator(const VLSimOptions& options) {
   return *s_Sim;
 }
 
-VL_WS_SetupParams VLTestSetupParams() {
+VL_WS_SetupParams VLTestSetupParams(int cacheType, int cacheData, const char* cachePath) {
   VLSimOptions defaults;
   static const std::string s_User = defaults.userName, s_Password = defaults.password, s_Key = defaults.apiKey;
   VL_WS_SetupParams params = {};
@@ -32,8 +33,9 @@ VL_WS_SetupParams VLTestSetupParams() {
   params.Password = s_Password.c_str();
   params.ContentType = VL_WS_SetupParams::GENERAL;
   params.EnvNum = VL_WS_ENV_PRODUCTION;
-  params.CacheType = 0;
-  params.CacheData = VL_WS_CacheParam::CACHE_NONE;
+  params.CacheType = cacheType;
+  params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(cacheType ? cacheData : 0);
+  params.CachePath = cachePath;
   params.AccessType = STREAM;
   return params;
 }
@@ -51,6 +53,11 @@ void VLSimClientTest::TearDown() {
 std::vector<VLSimRequest> VLSimClientTest::Requests(size_t count) {
   m_Sim.WaitForRequests(count, 5000);
   return m_Sim.Requests();
+}
+
+void VLSimClientTest::ClearRequests() {
+  m_Sim.WaitForRequests(SIZE_MAX, 200);
+  m_Sim.ClearRequests();
 }
 
 void VLSimClientTest::Fault(const std::string& spec) {

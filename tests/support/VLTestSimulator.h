@@ -19,8 +19,9 @@ VLSimServer& VLTestSimulator(const VLSimOptions& options = VLSimOptions());
 
 // A setup record the simulator accepts: its user, password and API key, device
 // "00-11-22-33-44-55" of type 7, the general catalogue in production, access type STREAM (no
-// question to the store), no cache and no proxy. The strings are static.
-VL_WS_SetupParams VLTestSetupParams();
+// question to the store), no proxy, and a cache of the type given (none by default) of the kinds
+// in cacheData in the folder cachePath. The strings are static, but for cachePath.
+VL_WS_SetupParams VLTestSetupParams(int cacheType = 0, int cacheData = 7, const char* cachePath = nullptr);
 
 // Calls operation with the arguments and a record of its own, checks that the record carries a
 // tag (the given one, unless that is VL_WS_TAG_NONE) and that it is released; returns the
@@ -45,6 +46,9 @@ class VLSimClientTest : public testing::Test {
   // The request log once it holds count requests (waiting up to 5 s): the simulator logs a
   // request after its answer went out, and the client may be done with the answer before.
   std::vector<VLSimRequest> Requests(size_t count);
+  // Empties the request log once the requests answered so far are in it: for the same reason, it
+  // gives them 200 ms to arrive first.
+  void ClearRequests();
   void Fault(const std::string& spec);
 
   VLSimServer& m_Sim = VLTestSimulator();
