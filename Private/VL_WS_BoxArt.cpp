@@ -13,8 +13,6 @@
 
 namespace {
 
-enum { kNoCache = 0, kMemoryCache = 1, kFileCache = 2 };
-
 // One image asked of a client: its cache row, and the downloads that fill or revalidate it.
 // Every download goes through the catalogue context, without its proxy.
 class BoxArtRequest {

@@ -27,7 +27,7 @@ extern "C" VL_WS_Status VL_WS_updateLocalCache(VL_WS_Handle* handle, int dataKin
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   CacheInterface* cache = client->m_Cache;
   const int kinds = dataKinds & client->m_Params.CacheParam.CacheData;
-  if (cache == 0 || client->m_Params.CacheParam.CacheType == 0 || kinds == 0) return VL_WS_OK;
+  if (cache == 0 || client->m_Params.CacheParam.CacheType == kNoCache || kinds == 0) return VL_WS_OK;
 
   if (kinds & VL_WS_CacheParam::CACHE_METADATA) {
     // Cached answers go when the store's catalogue was loaded since; when the time cannot be

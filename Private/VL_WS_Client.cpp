@@ -19,8 +19,6 @@ namespace {
 const size_t kMaxDestinationUniqueIDLength = 350;
 const unsigned int kMinCacheLimit = 358400;  // 350 KiB
 
-enum CacheType { kNoCache = 0, kMemoryCache = 1, kFileCache = 2 };
-
 const VL_WS_EnvListEntry kEnvironments[] = {
     {VL_WS_ENV_STGAPI, "stgapi"}, {VL_WS_ENV_STG, "stg"}, {VL_WS_ENV_PRODUCTION, "production"}, {VL_WS_ENV_DEFAULT, "default"}};
 
