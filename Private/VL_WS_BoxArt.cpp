@@ -9,7 +9,7 @@
 #include "VLRecord.h"
 #include "VLUtilities.h"
 #include "VL_WS.h"
-#include "VL_WS_Client.h"
+#include "VL_WS_Call.h"
 
 namespace {
 

@@ -2,7 +2,6 @@
 // the environment queries and VL_WS_getVersion.
 #include "VL_WS_Client.h"
 
-#include <limits.h>
 #include <stdio.h>
 #include <string.h>
 
@@ -127,17 +126,6 @@ CacheInterface* OpenCache(const VL_WS_CacheParam2& params, bool deleteDamaged) {
 }  // namespace
 
 VL_WS_Client* VLClientOf(const VL_WS_Handle* handle) { return handle != 0 ? handle->client : 0; }
-
-bool VLPageFits(int currentPageNumber, int itemsPerPage) {
-  for (int value : {currentPageNumber, itemsPerPage})
-    if (value < SHRT_MIN || value > SHRT_MAX) return false;
-  return true;
-}
-
-void VLEndCall(soap& context) {
-  soap_destroy(&context);
-  soap_end(&context);
-}
 
 void VLClientRelease(VL_WS_Client* client) {
   if (client->m_Cache) {
