@@ -88,8 +88,10 @@ class VLSoapProxy : public soap {
   int m_LogAreaId;  // "soap_proxy"
 };
 
-// Defines operation name of proxy class Proxy: name is the operation (the method's name), Type
-// the generated record name part (the operation with "_" written "_USCORE").
+// Declares and defines operation name of a proxy class: name is the operation (the method's
+// name), Type the generated record name part (the operation with "_" written "_USCORE"). The
+// proxies apply them to the list of their service's operations.
+#define VL_SOAP_DECLARE(name, Type) virtual int name(_VL1__##Type* request, _VL1__##Type##Response* response);
 #define VL_SOAP_OPERATION(Proxy, name, Type)                                                        \
   int Proxy::name(_VL1__##Type* request, _VL1__##Type##Response* response) {                       \
     return Call(#Proxy "::" #name, "VL1:" #name, "VL1:" #name "Response", VL_API_NAMESPACE #name, \
