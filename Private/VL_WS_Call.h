@@ -12,11 +12,13 @@
 //  3. The end: the result line is logged and the status made (VLFoldedStatus, VLSoapStatus,
 //     VLBoolStatus); side effects wait for a call that succeeded (VLSucceeded, VLUserData).
 //
-// Most operations that answer one kept record take all three in one step (VLKeptRecord):
+// An operation that answers one kept record takes the call and its end in one step
+// (VLKeptRecord):
 //
 //   VL_WS_Client* client = VLClientFor(handle, titles);
 //   if (client == 0 || !VLPageFits(currentPageNumber, itemsPerPage)) return VL_WS_E_INVALID_ARGUMENT;
-//   return VLKeptRecord(*client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getTitlesByNavigation),
+//   return VLKeptRecord(
+//       *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getTitlesByNavigation),
 //       {VLCacheKind::kMetaData, "getTitles", VLCacheKey("%d,%d,%d,%d", ...)},
 //       [&](_VL1__getTitlesByNavigation& request) { request.GenreID = genreID; ... },
 //       VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles, "VL_WS_getTitles", VLFoldedStatus);
@@ -33,7 +35,7 @@
 #include "VL_WS_Client.h"
 #include "VL_WS_Records.h"
 
-// ---- 1. The start ----------------------------------------------------------------------------
+// ---- 1. The start -------------------------------------------------------------------------------
 
 // Clears and tags record, then gives the handle's client state. Null when the record or the
 // client state is missing.
@@ -52,7 +54,7 @@ VL_WS_Client* VLClientFor(const VL_WS_Handle* handle, int* value);
 // 16-bit fields, so a value beyond them would come back wrapped (100000 as -31072).
 bool VLPageFits(int currentPageNumber, int itemsPerPage);
 
-// ---- 2. The call -----------------------------------------------------------------------------
+// ---- 2. The call --------------------------------------------------------------------------------
 
 // Where a kind of cached data is kept: the cache's read and write calls for it and its bit of
 // the cache settings (VL_WS_CacheParam::CacheData), without which nothing is written.
@@ -210,7 +212,7 @@ int VLServiceCall(VL_WS_Client& client, Service& service,
   });
 }
 
-// ---- 3. The end ------------------------------------------------------------------------------
+// ---- 3. The end ---------------------------------------------------------------------------------
 
 // The end of an operation that returns a record: logs its result line
 // "<name>, ret:<soapError>,responseCode:<responseCode>" and returns its status.
@@ -235,7 +237,7 @@ inline bool VLSucceeded(int soapError, bool answered, int responseCode) {
 // The handle's cache when it keeps user data (CACHE_USERDATA), else null.
 CacheInterface* VLUserData(VL_WS_Client* client);
 
-// ---- The three in one --------------------------------------------------------------------------
+// ---- The call and its end in one ----------------------------------------------------------------
 
 // An operation that answers one record, kept in the cache under entry when its response code is
 // 0: the cached call of op on service, the record filled by convert (a VLUtilities record
