@@ -17,9 +17,6 @@ const int kMetaData = VL_WS_CacheParam::CACHE_METADATA;
 const int kBoxArt = VL_WS_CacheParam::CACHE_BOXART;
 const int kUserData = VL_WS_CacheParam::CACHE_USERDATA;
 
-const int kMemoryCache = 1;
-const int kFileCache = 2;
-
 // How long an operation waits for other connections to the same file, which hold their locks
 // for one operation each.
 const int kBusyTimeoutMs = 10000;
@@ -41,8 +38,12 @@ int BusyWait(void*, int retries) {
 // The Userdata name of the per-title wishlist flags.
 const char kWishlistFlag[] = "WishlistFlag";
 
-// At most this many images are evicted by one write.
-const int kEvictionBatch = 10;
+// At most this many images are evicted by one write. A macro, so that the eviction statements
+// below spell the same number in their text.
+#define VL_EVICTION_BATCH 10
+#define VL_TEXT(number) VL_DIGITS(number)
+#define VL_DIGITS(number) #number
+const int kEvictionBatch = VL_EVICTION_BATCH;
 
 const char* const kSchema[] = {
     "CREATE TABLE IF NOT EXISTS Service (Name TEXT NOT NULL, Key TEXT NOT NULL, Value TEXT NOT "
@@ -82,9 +83,10 @@ const char kDeleteService[] = "DELETE FROM Service";
 const char kSumService[] = "SELECT SUM(Size) FROM Service";
 const char kSumUserdata[] = "SELECT SUM(Size) FROM Userdata";
 const char kSumBoxArt[] = "SELECT SUM(Size) FROM BoxArt";
-const char kOldestBoxArt[] = "SELECT Prefix, Dim FROM BoxArt ORDER BY TS ASC LIMIT 10";
+const char kOldestBoxArt[] = "SELECT Prefix, Dim FROM BoxArt ORDER BY TS ASC LIMIT " VL_TEXT(VL_EVICTION_BATCH);
 const char kDeleteOldestBoxArt[] =
-    "DELETE FROM BoxArt WHERE Prefix in (SELECT Prefix FROM BoxArt ORDER BY TS ASC LIMIT 10)";
+    "DELETE FROM BoxArt WHERE Prefix in "
+    "(SELECT Prefix FROM BoxArt ORDER BY TS ASC LIMIT " VL_TEXT(VL_EVICTION_BATCH) ")";
 const char kBeginImmediate[] = "BEGIN IMMEDIATE";
 const char kBeginExclusive[] = "BEGIN EXCLUSIVE";
 const char kCommit[] = "COMMIT";
@@ -117,7 +119,7 @@ class CacheMgr::ScopedConnection {
 };
 
 CacheMgr::CacheMgr()
-    : m_CacheType(0),
+    : m_CacheType(kNoCache),
       m_CacheData(0),
       m_CacheLimit(0),
       m_Opened(false),
@@ -188,7 +190,7 @@ int CacheMgr::OpenConnection() {
   }
   int rc;
   switch (m_CacheType) {
-    case 0:
+    case kNoCache:
       return SQLITE_OK;
     case kMemoryCache:
       rc = sqlite3_open_v2(":memory:", &m_DB, SQLITE_OPEN_READWRITE, 0);

@@ -437,7 +437,7 @@ const DUDUVudAE::MethodEntry DUDUVudAE::s_Methods[] = {
                              "purchaseType:%d \n",
                              r.i[0], r.i[1], r.i[2], r.i[3]);
        o.m_PurchaseType = r.i[3];
-       o.m_PrefetchWanted = o.m_CacheType == kCacheFile;
+       o.m_PrefetchWanted = o.m_CacheType == kFileCache;
        return true;
      },
      DUDUVud::getTitles, RESULT_TITLES},
@@ -454,7 +454,7 @@ const DUDUVudAE::MethodEntry DUDUVudAE::s_Methods[] = {
      RESULT_TV_EPISODE_LIST},
     {"getAllTvEpisodeListings", nullptr, 2, {"titleid"},
      [](DUDUVudAE& o, const ASObject&, Param_Store&) {
-       o.m_PrefetchWanted = o.m_CacheType == kCacheFile;
+       o.m_PrefetchWanted = o.m_CacheType == kFileCache;
        return true;
      },
      DUDUVud::getAllTvEpisodeListings, RESULT_ALL_TV_EPISODE_LISTINGS},
@@ -474,7 +474,7 @@ const DUDUVudAE::MethodEntry DUDUVudAE::s_Methods[] = {
        o.m_PurchaseType = r.i[2];
        o.m_TypeFilter = r.i[3];
        o.m_WatchStatus = r.i[4];
-       o.m_PrefetchWanted = o.m_CacheType == kCacheFile;
+       o.m_PrefetchWanted = o.m_CacheType == kFileCache;
        return true;
      },
      DUDUVud::getMyVideos, RESULT_MY_VIDEOS},
@@ -482,7 +482,7 @@ const DUDUVudAE::MethodEntry DUDUVudAE::s_Methods[] = {
      [](DUDUVudAE& o, const ASObject&, Param_Store& r) {
        o.m_SortOrder = r.i[0];
        o.m_TypeFilter = r.i[3];
-       o.m_PrefetchWanted = o.m_CacheType == kCacheFile;
+       o.m_PrefetchWanted = o.m_CacheType == kFileCache;
        return true;
      },
      DUDUVud::getWishlistItems, RESULT_WISHLIST_ITEMS},
@@ -724,7 +724,7 @@ void DUDUVudAE::SafeDestroyThread(VLThread*& slot) {
 }
 
 void DUDUVudAE::MakePrefetchClients(const VL_WS_Handle* source) {
-  if (m_CacheType != kCacheFile) return;
+  if (m_CacheType != kFileCache) return;
   // A copy that failed may hold a partial handle: release it, so that an absent client is empty.
   auto duplicate = [source](VL_WS_Handle* copy) {
     if (VL_WS_duplicate(copy, source) != VL_WS_OK) VL_WS_release(copy);
@@ -782,7 +782,7 @@ void DUDUVudAE::OnUpdate(StageWindow*, ASObject& object) {
     DiscardResult();
     return;
   }
-  if (m_Result.status == VL_WS_OK && m_CacheType == kCacheFile && m_PrefetchWanted) SchedulePrefetch();
+  if (m_Result.status == VL_WS_OK && m_CacheType == kFileCache && m_PrefetchWanted) SchedulePrefetch();
   ASValue value;
   DUDUVud::SetResult(m_Result, value, callback);
   m_Result.type = RESULT_NONE;
@@ -821,7 +821,7 @@ void DUDUVudAE::Param::FinishInit(VL_WS_Status status) {
 }
 
 void DUDUVudAE::Param::RenewUserDataClient(const char* logLine) {
-  if (owner->m_CacheType != kCacheFile || !(owner->m_CacheData & VL_WS_CacheParam::CACHE_USERDATA)) return;
+  if (owner->m_CacheType != kFileCache || !(owner->m_CacheData & VL_WS_CacheParam::CACHE_USERDATA)) return;
   VLLogOutputwithConfig(Trace(), "%s", logLine);
   owner->SafeDestroyThread(owner->m_PagePrefetchThread);
   VL_WS_release(&owner->m_UserDataPrefetchClient);

@@ -28,6 +28,7 @@
 #include "IAEKernel.h"
 #include "VLThread.h"
 #include "VL_WS.h"
+#include "VL_WS_SetupParams2.h"
 
 class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
  public:
@@ -227,9 +228,6 @@ class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
   // Releases the out-record of a result that will not be delivered.
   void DiscardResult();
 
-  // The CacheType of a cache file, the only one that prefetching works with.
-  static const int kCacheFile = 2;
-
   Result m_Result;
   VL_WS_Handle m_Client;
   VL_WS_Handle m_CataloguePrefetchClient;
@@ -247,7 +245,8 @@ class DUDUVudAE : public ae::stagecraft::ASExtensionClass {
   int m_WatchStatus;
   int m_PurchaseType;
   int m_BoxArtSize;
-  // Copies of the CacheType and CacheData given to init (or taken over by clone).
+  // Copies of the CacheType and CacheData given to init (or taken over by clone). Prefetching
+  // works with a cache file (kFileCache) only.
   int m_CacheType;
   int m_CacheData;
   std::atomic<bool> m_Initialised;

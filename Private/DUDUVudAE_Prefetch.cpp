@@ -337,7 +337,7 @@ void DUDUVudAE::SchedulePrefetch() {
 void DUDUVudAE::StartBoxArtDownload() {
   if (!m_IdleSeen || m_PagePrefetchRunning.load() || m_BoxArtPrefetchRunning.load()) return;
   // Without its own client (CacheData without catalogue pages) nothing could be downloaded.
-  if (m_CacheType != kCacheFile || !(m_CacheData & VL_WS_CacheParam::CACHE_BOXART) || !m_BoxArtPrefetchClient.client) {
+  if (m_CacheType != kFileCache || !(m_CacheData & VL_WS_CacheParam::CACHE_BOXART) || !m_BoxArtPrefetchClient.client) {
     return;
   }
   PrefetchParam* record = nullptr;

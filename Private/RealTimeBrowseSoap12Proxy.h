@@ -1,5 +1,5 @@
 // RealTimeBrowseSoap12Proxy: the proxy of the store's catalogue service "RealTimeBrowse.asmx" (binding VL3,
-// RealTimeBrowseSoap12). One operation per service operation, in the order of the service's interface;
+// RealTimeBrowseSoap12). One operation per service operation (VL_REALTIMEBROWSE_OPERATIONS);
 // each takes the request and the response record (both allocated in this context) and returns
 // the gSOAP error code. The call sequence is VLSoapProxy's; RealTimeBrowse adds the endpoint and the
 // header blocks.
@@ -7,6 +7,28 @@
 #define REALTIMEBROWSESOAP12PROXY_H
 
 #include "VLSoapProxy.h"
+
+// The catalogue service's operations, in the order of its interface: OP(name, Type), name the
+// operation, Type the generated record name part (the operation with "_" written "_USCORE").
+#define VL_REALTIMEBROWSE_OPERATIONS(OP)                                                                      \
+  OP(getFileType, getFileType)                                                                                \
+  OP(getNavigation, getNavigation)                                                                            \
+  OP(searchForTitle, searchForTitle)                                                                          \
+  OP(searchForTitleDetail, searchForTitleDetail)                                                              \
+  OP(getGenreLabel, getGenreLabel)                                                                            \
+  OP(getTitlesByNavigation, getTitlesByNavigation)                                                            \
+  OP(getTitlesByGenreArray, getTitlesByGenreArray)                                                            \
+  OP(getTitleListing, getTitleListing)                                                                        \
+  OP(getTitleListingByAsset, getTitleListingByAsset)                                                          \
+  OP(getTvEpisodeListByTitleID, getTvEpisodeListByTitleID)                                                    \
+  OP(getTvEpisodeListing, getTvEpisodeListing)                                                                \
+  OP(getAllTvEpisodeListings, getAllTvEpisodeListings)                                                        \
+  OP(translateTivoExternalId, translateTivoExternalId)                                                        \
+  OP(translateSkuId, translateSkuId)                                                                          \
+  OP(shouldUpdateCache, shouldUpdateCache)                                                                    \
+  OP(getLastCacheLoadTimeUTC, getLastCacheLoadTimeUTC)                                                        \
+  OP(getRecommendedTitles, getRecommendedTitles)                                                              \
+  OP(getRecommendedTitles_SpecifyOutput, getRecommendedTitles_USCORESpecifyOutput)
 
 class RealTimeBrowseSoap12Proxy : public VLSoapProxy {
  public:
@@ -17,24 +39,7 @@ class RealTimeBrowseSoap12Proxy : public VLSoapProxy {
   // installs the namespace table.
   virtual void RealTimeBrowseSoap12Proxy_init(int imode, int omode);
 
-  virtual int getFileType(_VL1__getFileType* request, _VL1__getFileTypeResponse* response);
-  virtual int getNavigation(_VL1__getNavigation* request, _VL1__getNavigationResponse* response);
-  virtual int searchForTitle(_VL1__searchForTitle* request, _VL1__searchForTitleResponse* response);
-  virtual int searchForTitleDetail(_VL1__searchForTitleDetail* request, _VL1__searchForTitleDetailResponse* response);
-  virtual int getGenreLabel(_VL1__getGenreLabel* request, _VL1__getGenreLabelResponse* response);
-  virtual int getTitlesByNavigation(_VL1__getTitlesByNavigation* request, _VL1__getTitlesByNavigationResponse* response);
-  virtual int getTitlesByGenreArray(_VL1__getTitlesByGenreArray* request, _VL1__getTitlesByGenreArrayResponse* response);
-  virtual int getTitleListing(_VL1__getTitleListing* request, _VL1__getTitleListingResponse* response);
-  virtual int getTitleListingByAsset(_VL1__getTitleListingByAsset* request, _VL1__getTitleListingByAssetResponse* response);
-  virtual int getTvEpisodeListByTitleID(_VL1__getTvEpisodeListByTitleID* request, _VL1__getTvEpisodeListByTitleIDResponse* response);
-  virtual int getTvEpisodeListing(_VL1__getTvEpisodeListing* request, _VL1__getTvEpisodeListingResponse* response);
-  virtual int getAllTvEpisodeListings(_VL1__getAllTvEpisodeListings* request, _VL1__getAllTvEpisodeListingsResponse* response);
-  virtual int translateTivoExternalId(_VL1__translateTivoExternalId* request, _VL1__translateTivoExternalIdResponse* response);
-  virtual int translateSkuId(_VL1__translateSkuId* request, _VL1__translateSkuIdResponse* response);
-  virtual int shouldUpdateCache(_VL1__shouldUpdateCache* request, _VL1__shouldUpdateCacheResponse* response);
-  virtual int getLastCacheLoadTimeUTC(_VL1__getLastCacheLoadTimeUTC* request, _VL1__getLastCacheLoadTimeUTCResponse* response);
-  virtual int getRecommendedTitles(_VL1__getRecommendedTitles* request, _VL1__getRecommendedTitlesResponse* response);
-  virtual int getRecommendedTitles_SpecifyOutput(_VL1__getRecommendedTitles_USCORESpecifyOutput* request, _VL1__getRecommendedTitles_USCORESpecifyOutputResponse* response);
+  VL_REALTIMEBROWSE_OPERATIONS(VL_SOAP_DECLARE)
 };
 
 #endif  // REALTIMEBROWSESOAP12PROXY_H

@@ -23,26 +23,9 @@ StreamDownloadAPI::operator soap&() {
   return *m_StreamAPI;
 }
 
-#define VL_DISPATCH(name)                                                                          \
-  int StreamDownloadAPI::name(_VL1__##name* request, _VL1__##name##Response* response) {         \
+#define VL_NOT_DISPATCHED(name, Type)
+#define VL_DISPATCHED(name, Type)                                                                 \
+  int StreamDownloadAPI::name(_VL1__##Type* request, _VL1__##Type##Response* response) {         \
     return Download() ? m_DownloadAPI->name(request, response) : m_StreamAPI->name(request, response); \
   }
-
-VL_DISPATCH(authorizeDevice)
-VL_DISPATCH(doPurchaseSavedbilling)
-VL_DISPATCH(checkRentalExpiration)
-VL_DISPATCH(getBillingInfo)
-VL_DISPATCH(showPrePaidCardBalance)
-VL_DISPATCH(getEmailAddress)
-VL_DISPATCH(getSettingsPageInfo)
-VL_DISPATCH(assignGiftCertificateToUser)
-VL_DISPATCH(getWishlistItems)
-VL_DISPATCH(removeItemFromWishList)
-VL_DISPATCH(removeAllItemsFromWishList)
-VL_DISPATCH(addItemToWishlist)
-VL_DISPATCH(checkAdultVerificationEnabled)
-VL_DISPATCH(checkAdultVerificationPin)
-VL_DISPATCH(getConfig)
-VL_DISPATCH(deactivateDevice)
-VL_DISPATCH(checkAuthToken)
-VL_DISPATCH(GetCountryID)
+VL_DOWNLOADAPI_OPERATIONS(VL_NOT_DISPATCHED, VL_DISPATCHED)

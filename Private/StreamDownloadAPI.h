@@ -24,25 +24,13 @@ class StreamDownloadAPI {
   // in it and end the call with it.
   operator soap&();
 
-  // The dispatched operations: each calls the same operation of the selected object.
-  int authorizeDevice(_VL1__authorizeDevice* request, _VL1__authorizeDeviceResponse* response);
-  int doPurchaseSavedbilling(_VL1__doPurchaseSavedbilling* request, _VL1__doPurchaseSavedbillingResponse* response);
-  int checkRentalExpiration(_VL1__checkRentalExpiration* request, _VL1__checkRentalExpirationResponse* response);
-  int getBillingInfo(_VL1__getBillingInfo* request, _VL1__getBillingInfoResponse* response);
-  int showPrePaidCardBalance(_VL1__showPrePaidCardBalance* request, _VL1__showPrePaidCardBalanceResponse* response);
-  int getEmailAddress(_VL1__getEmailAddress* request, _VL1__getEmailAddressResponse* response);
-  int getSettingsPageInfo(_VL1__getSettingsPageInfo* request, _VL1__getSettingsPageInfoResponse* response);
-  int assignGiftCertificateToUser(_VL1__assignGiftCertificateToUser* request, _VL1__assignGiftCertificateToUserResponse* response);
-  int getWishlistItems(_VL1__getWishlistItems* request, _VL1__getWishlistItemsResponse* response);
-  int removeItemFromWishList(_VL1__removeItemFromWishList* request, _VL1__removeItemFromWishListResponse* response);
-  int removeAllItemsFromWishList(_VL1__removeAllItemsFromWishList* request, _VL1__removeAllItemsFromWishListResponse* response);
-  int addItemToWishlist(_VL1__addItemToWishlist* request, _VL1__addItemToWishlistResponse* response);
-  int checkAdultVerificationEnabled(_VL1__checkAdultVerificationEnabled* request, _VL1__checkAdultVerificationEnabledResponse* response);
-  int checkAdultVerificationPin(_VL1__checkAdultVerificationPin* request, _VL1__checkAdultVerificationPinResponse* response);
-  int getConfig(_VL1__getConfig* request, _VL1__getConfigResponse* response);
-  int deactivateDevice(_VL1__deactivateDevice* request, _VL1__deactivateDeviceResponse* response);
-  int checkAuthToken(_VL1__checkAuthToken* request, _VL1__checkAuthTokenResponse* response);
-  int GetCountryID(_VL1__GetCountryID* request, _VL1__GetCountryIDResponse* response);
+  // The dispatched operations, SHARED in VL_DOWNLOADAPI_OPERATIONS: each calls the same
+  // operation of the selected object.
+#define VL_NOT_DISPATCHED(name, Type)
+#define VL_DISPATCHED(name, Type) int name(_VL1__##Type* request, _VL1__##Type##Response* response);
+  VL_DOWNLOADAPI_OPERATIONS(VL_NOT_DISPATCHED, VL_DISPATCHED)
+#undef VL_NOT_DISPATCHED
+#undef VL_DISPATCHED
 
  private:
   bool Download() const { return m_AccessType == DOWNLOAD; }

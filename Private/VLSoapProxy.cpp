@@ -97,7 +97,9 @@ int VLSoapProxy::Receive(const char* responseTag, const Body& body) {
   body.get(this, body.response, responseTag);
   // Another element than the response at body level is read as a fault.
   if (error) return FaultKind(this, soap_recv_fault(this, 0));
-  if (soap_body_end_in(this) || soap_envelope_end_in(this) || soap_end_recv(this)) return soap_closesock(this);
+  // The end of the message: an error in it is the call's. The connection closes either way, and
+  // soap_closesock returns the error the reading left, SOAP_OK when none.
+  if (soap_body_end_in(this) == SOAP_OK && soap_envelope_end_in(this) == SOAP_OK) soap_end_recv(this);
   return soap_closesock(this);
 }
 

@@ -1,19 +1,10 @@
 // VLSoapProxy: what the three service proxies (RealTimeBrowseSoap12Proxy, StreamAPISoap12Proxy,
 // DownloadAPISoap12Proxy) have in common: a gSOAP context (the proxy derives from soap) with the
-// library's transport, the endpoint pointer, and the one call sequence every operation runs.
+// library's transport, the endpoint pointer, and the one call that every operation makes (Call).
 //
-// Call sequence of an operation (request and response records live in this context; the caller
-// frees them after reading the result):
-//  1. "Entering <Proxy>::<operation>" to "soap_proxy" (level 4).
-//  2. The endpoint (the fallback one if none was set); document/literal, no encoding style.
-//  3. A length pass over envelope, header and request, then the request with that
-//     Content-Length over a new connection (no keep-alive, no chunking).
-//  4. Without a response record the connection is closed and the current error returned.
-//  5. The reply: HTTP status and headers (gzip and deflate inflated), the envelope, the header,
-//     the body, and the response element "VL1:<operation>Response" into the record. Another
-//     element at body level (a SOAP fault) is read as the fault and its result returned.
-//  6. The connection is closed, "Exiting <Proxy>::<operation>" logged, and the error code
-//     returned (0 on success; an HTTP status also logs "HTTP error %d" to "soap_test").
+// A call is one exchange on a connection of its own (no keep-alive): the request goes whole,
+// with its Content-Length (no chunking), and the reply may come compressed. The request and
+// response records live in this context; the caller frees them once it has read the result.
 #ifndef VLSOAPPROXY_H
 #define VLSOAPPROXY_H
 
@@ -53,9 +44,15 @@ class VLSoapProxy : public soap {
   // installs the namespace table.
   void Init(int imode, int omode);
 
-  // One operation: runs the call sequence above. logName is "<Proxy>::<operation>", requestTag
-  // "VL1:<operation>", responseTag "VL1:<operation>Response", action the SOAPAction; request
-  // must not be null.
+  // One operation: sends request as the body of a document/literal envelope to the endpoint
+  // (the fallback one while none is set) and, when response is given, reads the reply's
+  // response element into it. Returns 0 or the gSOAP error: an HTTP status, SOAP_SVR_FAULT or
+  // SOAP_CLI_FAULT for a fault of the server or of the client whatever the prefix of its code,
+  // another error of the fault or of the exchange. The connection is closed when it returns.
+  // Logs "Entering <logName>" and "Exiting <logName>" to "soap_proxy" (level 4), and an HTTP
+  // status as "HTTP error <status>" to "soap_test". logName is "<Proxy>::<operation>",
+  // requestTag "VL1:<operation>", responseTag "VL1:<operation>Response", action the SOAPAction;
+  // request must not be null.
   template <class Request, class Response>
   int Call(const char* logName, const char* requestTag, const char* responseTag, const char* action,
            const Request* request, Response* response) {
@@ -88,8 +85,10 @@ class VLSoapProxy : public soap {
   int m_LogAreaId;  // "soap_proxy"
 };
 
-// Defines operation name of proxy class Proxy: name is the operation (the method's name), Type
-// the generated record name part (the operation with "_" written "_USCORE").
+// Declares and defines operation name of a proxy class: name is the operation (the method's
+// name), Type the generated record name part (the operation with "_" written "_USCORE"). The
+// proxies apply them to the list of their service's operations.
+#define VL_SOAP_DECLARE(name, Type) virtual int name(_VL1__##Type* request, _VL1__##Type##Response* response);
 #define VL_SOAP_OPERATION(Proxy, name, Type)                                                        \
   int Proxy::name(_VL1__##Type* request, _VL1__##Type##Response* response) {                       \
     return Call(#Proxy "::" #name, "VL1:" #name, "VL1:" #name "Response", VL_API_NAMESPACE #name, \

@@ -5,7 +5,6 @@
 #include "VLWSAELog.h"
 #include "VL_WS.h"
 #include "VL_WS_Call.h"
-#include "VL_WS_Client.h"
 
 static VLLogArea s_Log(VLWSAELOG_AREA_NAME);
 
@@ -42,7 +41,7 @@ extern "C" VL_WS_Status VL_WS_authorizeDevice(VL_WS_Handle* handle, int pin, VL_
     client->m_Params.AuthToken = answer->AuthToken;
     if (CacheInterface* cache = VLUserData(client)) cache->PurgeUserData(VLString());
   }
-  return VLFoldedStatus("VL_WS_authorizeDevice", soapError, answer->ResponseCode, "VL_WS_authorizeDevice");
+  return VLFoldedStatus("VL_WS_authorizeDevice", soapError, answer->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_deactivateDevice(VL_WS_Handle* handle, VL_WS_StandardResponse* answer) {
@@ -74,16 +73,25 @@ extern "C" VL_WS_Status VL_WS_checkAuthToken(VL_WS_Handle* handle, bool* valid) 
   return VLBoolStatus("VL_WS_checkAuthToken", soapError, *valid);
 }
 
+// The account's e-mail address and settings page are kept as user data, one answer per cache:
+// the Key is empty.
 extern "C" VL_WS_Status VL_WS_getEmailAddress(VL_WS_Handle* handle, VL_WS_EmailAddressResponse* answer) {
-  return VLKeptAccountRecord(handle, answer, "VL_WS_getEmailAddress",
-                             VL_SERVICE_OPERATION(StreamDownloadAPI, getEmailAddress),
-                             VLUtilities::VL1__GetEmailAddressResponse2VL_WS_EmailAddressResponse);
+  VL_WS_Client* client = VLClientFor(handle, answer);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  return VLKeptRecord(*client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, getEmailAddress),
+                      {VLCacheKind::kUserData, "getEmailAddress", VLString()}, VLNoFields(),
+                      VLUtilities::VL1__GetEmailAddressResponse2VL_WS_EmailAddressResponse, *answer,
+                      "VL_WS_getEmailAddress", VLFoldedStatus);
 }
 
 extern "C" VL_WS_Status VL_WS_getSettingsPageInfo(VL_WS_Handle* handle, VL_WS_SettingsPageResponse* answer) {
-  return VLKeptAccountRecord(handle, answer, "VL_WS_getSettingsPageInfo",
-                             VL_SERVICE_OPERATION(StreamDownloadAPI, getSettingsPageInfo),
-                             VLUtilities::VL1__SettingsPageInfo2VL_WS_SettingsPageResponse);
+  VL_WS_Client* client = VLClientFor(handle, answer);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  return VLKeptRecord(*client, client->m_StreamDownloadAPI,
+                      VL_SERVICE_OPERATION(StreamDownloadAPI, getSettingsPageInfo),
+                      {VLCacheKind::kUserData, "getSettingsPageInfo", VLString()}, VLNoFields(),
+                      VLUtilities::VL1__SettingsPageInfo2VL_WS_SettingsPageResponse, *answer,
+                      "VL_WS_getSettingsPageInfo", VLFoldedStatus);
 }
 
 extern "C" VL_WS_Status VL_WS_getConfig(VL_WS_Handle* handle, VL_WS_ConfigResponse* config) {

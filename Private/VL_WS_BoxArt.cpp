@@ -9,11 +9,9 @@
 #include "VLRecord.h"
 #include "VLUtilities.h"
 #include "VL_WS.h"
-#include "VL_WS_Client.h"
+#include "VL_WS_Call.h"
 
 namespace {
-
-enum { kNoCache = 0, kMemoryCache = 1, kFileCache = 2 };
 
 // One image asked of a client: its cache row, and the downloads that fill or revalidate it.
 // Every download goes through the catalogue context, without its proxy.

@@ -1,11 +1,10 @@
 // Freshness of a handle's cache: the store's last catalogue load time and the refresh of the
 // cached kinds of data.
-#include "VL_WS_Call.h"
 #include "VLRecord.h"
 #include "VLUtilities.h"
 #include "VLWSAELog.h"
 #include "VL_WS.h"
-#include "VL_WS_Client.h"
+#include "VL_WS_Call.h"
 
 static VLLogArea s_Log(VLWSAELOG_AREA_NAME);
 
@@ -27,7 +26,7 @@ extern "C" VL_WS_Status VL_WS_updateLocalCache(VL_WS_Handle* handle, int dataKin
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
   CacheInterface* cache = client->m_Cache;
   const int kinds = dataKinds & client->m_Params.CacheParam.CacheData;
-  if (cache == 0 || client->m_Params.CacheParam.CacheType == 0 || kinds == 0) return VL_WS_OK;
+  if (cache == 0 || client->m_Params.CacheParam.CacheType == kNoCache || kinds == 0) return VL_WS_OK;
 
   if (kinds & VL_WS_CacheParam::CACHE_METADATA) {
     // Cached answers go when the store's catalogue was loaded since; when the time cannot be
@@ -43,14 +42,11 @@ extern "C" VL_WS_Status VL_WS_updateLocalCache(VL_WS_Handle* handle, int dataKin
 }
 
 extern "C" VL_WS_Status VL_WS_shouldUpdateCache(VL_WS_Handle* handle, const char* utcTime, bool* update) {
-  if (update == 0) return VL_WS_E_INVALID_ARGUMENT;
-  *update = false;
-  VL_WS_Client* client = VLClientOf(handle);
+  VL_WS_Client* client = VLClientFor(handle, update);
   if (client == 0 || utcTime == 0 || *utcTime == 0) return VL_WS_E_INVALID_ARGUMENT;
   int soapError = VLServiceCall(
       *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, shouldUpdateCache),
       [&](_VL1__shouldUpdateCache& request) { request.UTCTime = const_cast<char*>(utcTime); },
       [&](int result) { *update = result == 1; });
-  VLLogOutputwithConfig({s_Log.Id(), 4}, "%s, result:%d\n", "VL_WS_shouldUpdateCache", *update);
-  return VLUtilities::To_VL_WS_Status(soapError);
+  return VLBoolStatus("VL_WS_shouldUpdateCache", soapError, *update);
 }

@@ -1,6 +1,6 @@
 // Catalogue operations of the client: the genre tree, pages of titles, title and episode details,
 // search, recommendations and the translation of TiVo and SKU identifiers, all answered by the
-// catalogue service and, where they are cached, by the handle's cache first (VLCachedCall.h, VL_WS_Call.h).
+// catalogue service and, where they are cached, by the handle's cache first (VL_WS_Call.h).
 #include <string.h>
 
 #include "VL_WS_Call.h"
@@ -43,10 +43,10 @@ VL_WS_Status Search(const char* name, const char* cacheName, const Operation& op
   VL_WS_Client* client = VLClientFor(handle, titles);
   if (client == 0 || query == 0 || *query == 0 || !VLPageFits(currentPageNumber, itemsPerPage))
     return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kMetaData, cacheName,
-                        VLCacheKey("%d,%d,%d,%d,%s", currentPageNumber, itemsPerPage, purchaseType, titleType, query)};
-  int soapError = VLCachedCall(
-      *client, client->m_RealTimeBrowse, operation, &entry,
+  return VLKeptRecord(
+      *client, client->m_RealTimeBrowse, operation,
+      {VLCacheKind::kMetaData, cacheName,
+       VLCacheKey("%d,%d,%d,%d,%s", currentPageNumber, itemsPerPage, purchaseType, titleType, query)},
       [&](auto& request) {
         request.Query = const_cast<char*>(query);
         request.ItemsPerPage = itemsPerPage;
@@ -54,8 +54,7 @@ VL_WS_Status Search(const char* name, const char* cacheName, const Operation& op
         request.PurchaseType = static_cast<VL1__StreamAPIPurchaseType>(purchaseType);
         request.TitleType = static_cast<VL1__TitleTypeFilter>(titleType);
       },
-      VLKeptInto(VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles));
-  return VLSoapStatus(name, soapError, titles->ResponseCode);
+      VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles, name, VLSoapStatus);
 }
 
 }  // namespace
@@ -89,18 +88,17 @@ extern "C" VL_WS_Status VL_WS_getTitles(VL_WS_Handle* handle, int genreID, int c
                                         int purchaseType, VL_WS_TitlesResponse* titles) {
   VL_WS_Client* client = VLClientFor(handle, titles);
   if (client == 0 || !VLPageFits(currentPageNumber, itemsPerPage)) return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kMetaData, "getTitles",
-                        VLCacheKey("%d,%d,%d,%d", genreID, currentPageNumber, itemsPerPage, purchaseType)};
-  int soapError = VLCachedCall(
-      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getTitlesByNavigation), &entry,
+  return VLKeptRecord(
+      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getTitlesByNavigation),
+      {VLCacheKind::kMetaData, "getTitles",
+       VLCacheKey("%d,%d,%d,%d", genreID, currentPageNumber, itemsPerPage, purchaseType)},
       [&](_VL1__getTitlesByNavigation& request) {
         request.GenreID = genreID;
         request.CurrentPageNumber = currentPageNumber;
         request.ItemsPerPage = itemsPerPage;
         request.PurchaseType = static_cast<VL1__StreamAPIPurchaseType>(purchaseType);
       },
-      VLKeptInto(VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles));
-  return VLFoldedStatus("VL_WS_getTitles", soapError, titles->ResponseCode);
+      VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse, *titles, "VL_WS_getTitles", VLFoldedStatus);
 }
 
 extern "C" VL_WS_Status VL_WS_getTitlesByGenreIDs(VL_WS_Handle* handle, int count, const int* genreIDs,
@@ -149,12 +147,12 @@ extern "C" VL_WS_Status VL_WS_getTvEpisodeListByTitleID(VL_WS_Handle* handle, in
                                                         VL_WS_TvEpisodeListResponse* episodes) {
   VL_WS_Client* client = VLClientFor(handle, episodes);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kMetaData, "getTvEpisodeListByTitleID", VLCacheKey("%d", titleID)};
-  int soapError = VLCachedCall(
-      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getTvEpisodeListByTitleID), &entry,
-      [&](_VL1__getTvEpisodeListByTitleID& request) { request.TitleID = titleID; },
-      VLKeptInto(VLUtilities::VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse, *episodes));
-  return VLFoldedStatus("VL_WS_getTvEpisodeListByTitleID", soapError, episodes->ResponseCode);
+  return VLKeptRecord(*client, client->m_RealTimeBrowse,
+                      VL_SERVICE_OPERATION(RealTimeBrowse, getTvEpisodeListByTitleID),
+                      {VLCacheKind::kMetaData, "getTvEpisodeListByTitleID", VLCacheKey("%d", titleID)},
+                      [&](_VL1__getTvEpisodeListByTitleID& request) { request.TitleID = titleID; },
+                      VLUtilities::VL1__TvEpisodeList2VL_WS_TvEpisodeListResponse, *episodes,
+                      "VL_WS_getTvEpisodeListByTitleID", VLFoldedStatus);
 }
 
 extern "C" VL_WS_Status VL_WS_getAllTvEpisodeListings(VL_WS_Handle* handle, int titleID,
@@ -192,24 +190,22 @@ extern "C" VL_WS_Status VL_WS_translateTivoExternalID(VL_WS_Handle* handle, cons
                                                       VL_WS_TranslateTivoExternalIDResponse* translation) {
   VL_WS_Client* client = VLClientFor(handle, translation);
   if (client == 0 || tivoExternalID == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kMetaData, "translateTivoExternalId", VLCacheKey("%s", tivoExternalID)};
-  int soapError = VLCachedCall(
-      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, translateTivoExternalId), &entry,
+  return VLKeptRecord(
+      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, translateTivoExternalId),
+      {VLCacheKind::kMetaData, "translateTivoExternalId", VLCacheKey("%s", tivoExternalID)},
       [&](_VL1__translateTivoExternalId& request) { request.TivoExternalId = const_cast<char*>(tivoExternalID); },
-      VLKeptInto(VLUtilities::VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExternalIDResponse,
-                  *translation));
-  return VLSoapStatus("VL_WS_translateTivoExternalID", soapError, translation->ResponseCode);
+      VLUtilities::VL1__TranslateTivoExternalIDResponse2VL_WS_TranslateTivoExternalIDResponse, *translation,
+      "VL_WS_translateTivoExternalID", VLSoapStatus);
 }
 
 extern "C" VL_WS_Status VL_WS_translateSkuID(VL_WS_Handle* handle, int skuID, VL_WS_TranslateSkuIDResponse* translation) {
   VL_WS_Client* client = VLClientFor(handle, translation);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kMetaData, "translateSkuId", VLCacheKey("%d", skuID)};
-  int soapError = VLCachedCall(
-      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, translateSkuId), &entry,
-      [&](_VL1__translateSkuId& request) { request.SkuId = skuID; },
-      VLKeptInto(VLUtilities::VL1__TranslateSkuIdResponse2VL_WS_TranslateSkuIDResponse, *translation));
-  return VLSoapStatus("VL_WS_translateSkuID", soapError, translation->ResponseCode);
+  return VLKeptRecord(*client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, translateSkuId),
+                      {VLCacheKind::kMetaData, "translateSkuId", VLCacheKey("%d", skuID)},
+                      [&](_VL1__translateSkuId& request) { request.SkuId = skuID; },
+                      VLUtilities::VL1__TranslateSkuIdResponse2VL_WS_TranslateSkuIDResponse, *translation,
+                      "VL_WS_translateSkuID", VLSoapStatus);
 }
 
 extern "C" VL_WS_Status VL_WS_searchForTitle(VL_WS_Handle* handle, int currentPageNumber, int itemsPerPage,
@@ -231,10 +227,9 @@ extern "C" VL_WS_Status VL_WS_getRecommendedTitles(VL_WS_Handle* handle, int tit
                                                    VL_WS_RecommendedTitlesResponse* titles) {
   VL_WS_Client* client = VLClientFor(handle, titles);
   if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
-  VLCacheEntry entry = {VLCacheKind::kMetaData, "getRecommendedTitles", VLCacheKey("%d", titleID)};
-  int soapError = VLCachedCall(
-      *client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getRecommendedTitles), &entry,
-      [&](_VL1__getRecommendedTitles& request) { request.TitleId = titleID; },
-      VLKeptInto(VLUtilities::VL1__RecommendedTitlesResponse2VL_WS_RecommendedTitlesResponse, *titles));
-  return VLFoldedStatus("VL_WS_getRecommendedTitles", soapError, titles->ResponseCode);
+  return VLKeptRecord(*client, client->m_RealTimeBrowse, VL_SERVICE_OPERATION(RealTimeBrowse, getRecommendedTitles),
+                      {VLCacheKind::kMetaData, "getRecommendedTitles", VLCacheKey("%d", titleID)},
+                      [&](_VL1__getRecommendedTitles& request) { request.TitleId = titleID; },
+                      VLUtilities::VL1__RecommendedTitlesResponse2VL_WS_RecommendedTitlesResponse, *titles,
+                      "VL_WS_getRecommendedTitles", VLFoldedStatus);
 }

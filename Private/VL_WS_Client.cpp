@@ -2,7 +2,6 @@
 // the environment queries and VL_WS_getVersion.
 #include "VL_WS_Client.h"
 
-#include <limits.h>
 #include <stdio.h>
 #include <string.h>
 
@@ -18,8 +17,6 @@ namespace {
 
 const size_t kMaxDestinationUniqueIDLength = 350;
 const unsigned int kMinCacheLimit = 358400;  // 350 KiB
-
-enum CacheType { kNoCache = 0, kMemoryCache = 1, kFileCache = 2 };
 
 const VL_WS_EnvListEntry kEnvironments[] = {
     {VL_WS_ENV_STGAPI, "stgapi"}, {VL_WS_ENV_STG, "stg"}, {VL_WS_ENV_PRODUCTION, "production"}, {VL_WS_ENV_DEFAULT, "default"}};
@@ -129,17 +126,6 @@ CacheInterface* OpenCache(const VL_WS_CacheParam2& params, bool deleteDamaged) {
 }  // namespace
 
 VL_WS_Client* VLClientOf(const VL_WS_Handle* handle) { return handle != 0 ? handle->client : 0; }
-
-bool VLPageFits(int currentPageNumber, int itemsPerPage) {
-  for (int value : {currentPageNumber, itemsPerPage})
-    if (value < SHRT_MIN || value > SHRT_MAX) return false;
-  return true;
-}
-
-void VLEndCall(soap& context) {
-  soap_destroy(&context);
-  soap_end(&context);
-}
 
 void VLClientRelease(VL_WS_Client* client) {
   if (client->m_Cache) {

@@ -1,8 +1,7 @@
 // VL_WS_Client.h: the client state behind a VL_WS_Handle (tag 1). One block per handle: its
 // three SOAP service objects, the dispatcher of account operations, the handle's own settings and
-// its cache, whose decoded answers it shares with its duplicates. Also the steps that the client operations share: tag the
-// out-record and find the client (VLClientFor) and end a SOAP call (VLEndCall); the call itself
-// is VLCachedCall.h's.
+// its cache, whose decoded answers it shares with its duplicates. The operations that use it take
+// the steps of VL_WS_Call.h.
 #ifndef VL_WS_CLIENT_H
 #define VL_WS_CLIENT_H
 
@@ -14,7 +13,6 @@
 #include "StreamAPI.h"
 #include "StreamDownloadAPI.h"
 #include "VLAnswerMemo.h"
-#include "VLRecord.h"
 #include "VL_WS_SetupParams2.h"
 #include "VL_WS_Types.h"
 
@@ -32,27 +30,6 @@ struct VL_WS_Client {
 // The client state of a handle: null for a null handle and for a handle without client state,
 // which every operation refuses with -1000.
 VL_WS_Client* VLClientOf(const VL_WS_Handle* handle);
-
-// The first step of an operation with an out-record: clears and tags the record (before any
-// check, so that the caller can always release it), then gives the handle's client state. Null
-// when the record or the client state is missing; the operation answers -1000 then.
-template <class Record>
-VL_WS_Client* VLClientFor(const VL_WS_Handle* handle, Record* record) {
-  if (record == 0) return 0;
-  VLRecordInit(*record);
-  return VLClientOf(handle);
-}
-
-// Whether a page request can be answered: the store's answer carries page number and size in
-// 16-bit fields, so a value beyond them would come back wrapped (100000 as -31072). The paged
-// operations refuse any other with -1000.
-bool VLPageFits(int currentPageNumber, int itemsPerPage);
-
-// Ends one SOAP call on a service context: deletes the call's request and response records and
-// everything else the call allocated in the context (the reply's header and texts included) and
-// ends the context's message state. Nothing of the reply may be used afterwards. Every
-// operation runs it once per call, whatever the call's outcome.
-void VLEndCall(soap& context);
 
 // Frees a handle's client state: closes and deletes its cache, then destroys its settings, the
 // dispatcher and the three service objects. VL_WS_release calls it for a handle that has one.

@@ -3,7 +3,6 @@
 #include "VLUtilities.h"
 #include "VL_WS.h"
 #include "VL_WS_Call.h"
-#include "VL_WS_Client.h"
 
 namespace {
 
@@ -31,8 +30,7 @@ extern "C" VL_WS_Status VL_WS_doPurchaseSavedBilling(VL_WS_Handle* handle, int s
     cache->PurgeUserData("getWishlistItems");
     cache->RemoveAllWishlistFlags();
   }
-  return VLFoldedStatus("VL_WS_doPurchaseSavedBilling", soapError, answer->ResponseCode,
-                        "VL_WS_doPurchaseSavedBilling");
+  return VLFoldedStatus("VL_WS_doPurchaseSavedBilling", soapError, answer->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_calcOrderTax(VL_WS_Handle* handle, int skuID, VL_WS_OrderTaxResponse* tax) {
@@ -45,10 +43,14 @@ extern "C" VL_WS_Status VL_WS_calcOrderTax(VL_WS_Handle* handle, int skuID, VL_W
   return VLUtilities::To_VL_WS_Status(soapError, tax->ResponseCode, "VL_WS_calcOrderTax");
 }
 
+// Kept as user data, one answer per cache: the Key is empty.
 extern "C" VL_WS_Status VL_WS_getBillingInfo(VL_WS_Handle* handle, VL_WS_BillingInfoResponse* info) {
-  return VLKeptAccountRecord(handle, info, "VL_WS_getBillingInfo",
-                             VL_SERVICE_OPERATION(StreamDownloadAPI, getBillingInfo),
-                             VLUtilities::VL1__BillingInfoResponse2VL_WS_BillingInfoResponse, "VL_WS_getBillingInfo");
+  VL_WS_Client* client = VLClientFor(handle, info);
+  if (client == 0) return VL_WS_E_INVALID_ARGUMENT;
+  return VLKeptRecord(*client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, getBillingInfo),
+                      {VLCacheKind::kUserData, "getBillingInfo", VLString()}, VLNoFields(),
+                      VLUtilities::VL1__BillingInfoResponse2VL_WS_BillingInfoResponse, *info, "VL_WS_getBillingInfo",
+                      VLFoldedStatus);
 }
 
 extern "C" VL_WS_Status VL_WS_getBillingInfoAndPPCBalance(VL_WS_Handle* handle, VL_WS_BillingInfoAndPPCBalance* info) {
@@ -77,8 +79,7 @@ extern "C" VL_WS_Status VL_WS_assignGiftCertificateToUser(VL_WS_Handle* handle, 
       *client, client->m_StreamDownloadAPI, VL_SERVICE_OPERATION(StreamDownloadAPI, assignGiftCertificateToUser),
       [code](_VL1__assignGiftCertificateToUser& request) { request.GiftCertificateCode = const_cast<char*>(code); },
       VLInto(VLUtilities::VL1__GiftCertificateResponse2VL_WS_GiftCertificateResponse, *answer));
-  return VLFoldedStatus("VL_WS_assignGiftCertificateToUser", soapError, answer->ResponseCode,
-                        "VL_WS_assignGiftCertificateToUser");
+  return VLFoldedStatus("VL_WS_assignGiftCertificateToUser", soapError, answer->ResponseCode);
 }
 
 extern "C" VL_WS_Status VL_WS_getMyVideos(VL_WS_Handle* handle, int currentPageNumber, int itemsPerPage,

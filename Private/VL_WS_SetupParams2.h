@@ -9,9 +9,12 @@
 #include "VLString.h"
 #include "VL_WS_Types.h"
 
+// The types of cache: the values of VL_WS_SetupParams::CacheType and VL_WS_CacheParam2::CacheType.
+enum VLCacheType : int { kNoCache = 0, kMemoryCache = 1, kFileCache = 2 };
+
 // The handle's cache settings.
 struct VL_WS_CacheParam2 {
-  int CacheType = 0;   // 0 none, 1 database in memory, 2 database file
+  int CacheType = kNoCache;  // VLCacheType: none, database in memory, database file
   int CacheData = 0;   // bit set of VL_WS_CacheParam::CacheData
   int CacheLimit = 0;  // bytes; 0 = no limit
   VLString CachePath;  // full path of the cache file once initialised

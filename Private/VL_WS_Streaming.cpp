@@ -5,7 +5,6 @@
 #include "VLWSAELog.h"
 #include "VL_WS.h"
 #include "VL_WS_Call.h"
-#include "VL_WS_Client.h"
 
 namespace {
 

@@ -7,7 +7,6 @@
 #include "VLWS_IntVector.h"
 #include "VL_WS.h"
 #include "VL_WS_Call.h"
-#include "VL_WS_Client.h"
 
 namespace {
 

@@ -2,7 +2,7 @@
 // store on loopback, over real TLS and TCP — as a library that tests start in-process on
 // ephemeral ports, and that the program vlstore-sim runs in the foreground.
 //
-// Every logical store host (Private/VLStoreHosts.h) is served on the two ports and recognised by
+// Every logical store host (VLStoreHosts.h) is served on the two ports and recognised by
 // the Host header: a client reaches them through the destination override ConnectTo() and
 // trusts the simulator's own CA through CAFile() (the environment settings VLWS_CONNECT_TO and
 // SSL_CERT_FILE). The TLS port serves the SOAP services under "/api/" (and "/aac/api/" on the
