@@ -4,6 +4,7 @@
 #include <stdio.h>
 #include <stdlib.h>
 
+#include <algorithm>
 #include <memory>
 #include <string>
 
@@ -52,7 +53,10 @@ void VLSimClientTest::TearDown() {
 
 std::vector<VLSimRequest> VLSimClientTest::Requests(size_t count) {
   m_Sim.WaitForRequests(count, 5000);
-  return m_Sim.Requests();
+  std::vector<VLSimRequest> log = m_Sim.Requests();
+  std::stable_sort(log.begin(), log.end(),
+                   [](const VLSimRequest& a, const VLSimRequest& b) { return a.connection < b.connection; });
+  return log;
 }
 
 void VLSimClientTest::ClearRequests() {

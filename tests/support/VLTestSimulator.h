@@ -43,8 +43,9 @@ class VLSimClientTest : public testing::Test {
   void SetUp() override;
   void TearDown() override;
 
-  // The request log once it holds count requests (waiting up to 5 s): the simulator logs a
-  // request after its answer went out, and the client may be done with the answer before.
+  // The request log once it holds count requests (waiting up to 5 s), in the order the client
+  // connected: the simulator logs a request after its answer went out (or its handshake failed),
+  // so the client may be done with an answer, and on to the next request, before.
   std::vector<VLSimRequest> Requests(size_t count);
   // Empties the request log once the requests answered so far are in it: for the same reason, it
   // gives them 200 ms to arrive first.
