@@ -1,8 +1,8 @@
 // The script engine behind the stage, where a lax stand-in would hide a fault of the store's
 // classes: a reference kept beyond a call survives garbage collection only while kept, OnUpdate
 // runs on the engine's thread, instances are destructed when collected or at the close, handles
-// are for the engine's thread only, an error in a callback ends the movie, and values convert
-// as the script language converts them.
+// are for the engine's thread only, an error in a callback ends the movie, arrays are told from
+// other objects, and values convert as the script language converts them.
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -31,7 +31,8 @@ class Probe : public ASExtensionClass {
   static bool FiresEvents() { return false; }
   static void GetMethods(AEArray<Method>& table) {
     static const Method kMethods[] = {Method::Bind("keep", &Probe::keep), Method::Bind("release", &Probe::release),
-                                      Method::Bind("completeAfter", &Probe::completeAfter)};
+                                      Method::Bind("completeAfter", &Probe::completeAfter),
+                                      Method::Bind("isInstance", &Probe::isInstance)};
     table.Append(kMethods, sizeof kMethods / sizeof kMethods[0]);
   }
   static ASExtensionClass* ConstructInstance(StageWindow*, ASObject&, ASValueArray&) {
@@ -65,6 +66,11 @@ class Probe : public ASExtensionClass {
     m_Kept.CallMethod("onComplete", status, text);
     m_Kept.Release();
   }
+  // isInstance(object, className): the store's classes tell an Array argument from other objects
+  void isInstance(StageWindow*, ASObject&, ASValueArray& arguments, ASValue& result) {
+    result.SetBoolean(arguments.Get(0).AsObject().IsInstanceOf(arguments.Get(1).AsString().CString()));
+  }
+
  private:
   ASObject m_Kept;
   int m_Frames = 0;
@@ -140,6 +146,14 @@ TEST_F(Engine, AnErrorInACallbackIsTheMoviesErrorAndEndsIt) {
   EXPECT_TRUE(stage.Ended());
   EXPECT_EQ(1, stage.ExitStatus());
   EXPECT_NE(std::string::npos, stage.Error().find("callback failed")) << stage.Error();
+}
+
+TEST_F(Engine, ArraysAreToldFromOtherObjects) {
+  Play(
+      "var p = newExtension('test.Probe');"
+      "var kinds = [p.isInstance([], 'Array'), p.isInstance({}, 'Array'), p.isInstance(p, 'test.Probe'),"
+      "             p.isInstance({}, 'test.Probe')].join(' ');");
+  EXPECT_EQ("true false true false", Text("kinds"));
 }
 
 TEST(EngineDeathTest, HandlesAreForTheEnginesThreadOnly) {
