@@ -1,5 +1,6 @@
 // CacheMgr on a real SQLite file and in memory: budgets and eviction, the three kinds of data,
 // wishlist flags, the catalogue load time, and two objects sharing one file from two threads.
+// (Box-art rows, their validators and revalidation mark are read back by the box-art tests.)
 #include "CacheMgr.h"
 
 #include <gtest/gtest.h>
@@ -187,34 +188,6 @@ TEST_P(CacheKinds, UserDataEvictionEmptiesServiceTooAndNoBudgetNeverEvicts) {
     ASSERT_TRUE(m_Cache.WriteMetaData("a", std::to_string(i).c_str(), std::string(100000, 'x').c_str()));
   }
   EXPECT_TRUE(HasMeta(m_Cache, "a", "0"));
-}
-
-TEST_P(CacheKinds, BoxArtRowsKeepValidatorsAndRevalidationMark) {
-  ASSERT_EQ(0, Open(kAllData));
-  const std::string image("\xff\xd8\xff\0jpeg", 8);
-  ASSERT_TRUE(m_Cache.WriteBoxArt("abc", VL_WS_BOXART_135S, 4321, "Tue, 01 Mar 2011 10:00:00 GMT", 0,
-                                  VLString(image.data(), image.size())));
-  unsigned size = 1, needUpdate = 1;
-  VLString lastModified("x"), data("x");
-  ASSERT_TRUE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_135S, size, lastModified, needUpdate, data));
-  EXPECT_EQ(4321u, size);
-  EXPECT_EQ("Tue, 01 Mar 2011 10:00:00 GMT", Str(lastModified));
-  EXPECT_EQ(0u, needUpdate);
-  EXPECT_EQ(image, Str(data));
-
-  EXPECT_TRUE(m_Cache.SetBoxArtNeedUpdate());
-  ASSERT_TRUE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_135S, size, lastModified, needUpdate, data));
-  EXPECT_EQ(1u, needUpdate);
-
-  // Another size of the same title is another row; a miss resets every output.
-  EXPECT_FALSE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
-  EXPECT_EQ(0u, size + needUpdate + lastModified.length() + data.length());
-
-  // A file cache stores no bytes: its images are files.
-  ASSERT_TRUE(m_Cache.WriteBoxArt("abc", VL_WS_BOXART_95, 10, "", 0, ""));
-  ASSERT_TRUE(m_Cache.ReadBoxArt("abc", VL_WS_BOXART_95, size, lastModified, needUpdate, data));
-  EXPECT_EQ(10u, size);
-  EXPECT_EQ("", Str(data));
 }
 
 TEST_P(CacheKinds, LoadTimeChangeEmptiesServiceOnly) {
