@@ -63,7 +63,6 @@ TEST_F(EndpointQuery, OnlyAnOkAnswerOfOneDigitChoosesTheEnvironment) {
       "HTTP/1.1 200 OK\r\nContent-Length: 1\r\n\r\nx",  // not a digit
       "HTTP/1.1 200 OK\r\nContent-Length: 2\r\n\r\n10",
       "HTTP/1.1 404 Not Found\r\nContent-Length: 1\r\n\r\n1",
-      "HTTP/1.0 200 OK\r\nContent-Length: 1\r\n\r\n1",
       "",  // the service closes without answering
   };
   for (const char* reply : production) {
