@@ -1,6 +1,7 @@
 // CacheMgr on a real SQLite file and in memory: budgets and eviction, the three kinds of data,
-// wishlist flags, the catalogue load time, and two objects sharing one file from two threads.
-// (Box-art rows, their validators and revalidation mark are read back by the box-art tests.)
+// wishlist flags, and two objects sharing one file from two threads. (Box-art rows, their
+// validators and revalidation mark are read back by the box-art tests; what a new catalogue load
+// time drops, by the catalogue and client tests.)
 #include "CacheMgr.h"
 
 #include <gtest/gtest.h>
@@ -188,25 +189,6 @@ TEST_P(CacheKinds, UserDataEvictionEmptiesServiceTooAndNoBudgetNeverEvicts) {
     ASSERT_TRUE(m_Cache.WriteMetaData("a", std::to_string(i).c_str(), std::string(100000, 'x').c_str()));
   }
   EXPECT_TRUE(HasMeta(m_Cache, "a", "0"));
-}
-
-TEST_P(CacheKinds, LoadTimeChangeEmptiesServiceOnly) {
-  ASSERT_EQ(0, Open(kAllData));
-  ASSERT_TRUE(m_Cache.WriteMetaData("getTitles", "k", "page"));
-  ASSERT_TRUE(m_Cache.WriteWishlistFlag(1, true));
-  // The first time on a new database is a change.
-  EXPECT_TRUE(m_Cache.UpdateLastCacheLoadTime("2011-03-01T10:00:00"));
-  EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
-
-  ASSERT_TRUE(m_Cache.WriteMetaData("getTitles", "k", "page"));
-  EXPECT_TRUE(m_Cache.UpdateLastCacheLoadTime("2011-03-01T10:00:00"));
-  EXPECT_TRUE(HasMeta(m_Cache, "getTitles", "k"));
-
-  EXPECT_TRUE(m_Cache.UpdateLastCacheLoadTime("2011-03-02T10:00:00"));
-  EXPECT_FALSE(HasMeta(m_Cache, "getTitles", "k"));
-  EXPECT_EQ(1, Flag(m_Cache, 1));
-
-  EXPECT_FALSE(m_Cache.UpdateLastCacheLoadTime(""));
 }
 
 TEST_P(CacheKinds, WishlistFlags) {
