@@ -157,48 +157,19 @@ TEST_F(SerializerTest, EveryReaderReadsCompressedAndPlainValues) {
   }
 }
 
+// An empty page is written as an empty array, not left out; indented output reads back too.
 TEST_F(SerializerTest, IndentedOutputAndEmptyArrays) {
   VL1__GetTitlesResponse empty;
-  empty.Titles = soap_new_VL1__ArrayOfTitleListing(m_Owner);  // an empty page, not a missing one
+  empty.Titles = soap_new_VL1__ArrayOfTitleListing(m_Owner);
   std::unique_ptr<Serializer> writer(new Serializer(false, true));
   ASSERT_EQ(SOAP_OK, writer->Put(empty));
-  std::string text = Str(writer->GetXML());
-  EXPECT_NE(std::string::npos, text.find("\n\t<VL1:ResponseCode>0</VL1:ResponseCode>")) << text;
-
+  EXPECT_NE(std::string::npos, Str(writer->GetXML()).find("\n\t<VL1:ResponseCode>0</VL1:ResponseCode>"));
   std::unique_ptr<Serializer> reader(new Serializer(false, false));
   reader->SetXML(writer->GetXML());
   VL1__GetTitlesResponse read;
   ASSERT_EQ(SOAP_OK, reader->Get(read));
   ASSERT_NE(nullptr, read.Titles);
   EXPECT_EQ(0, read.Titles->__sizeTitleListing);
-  EXPECT_EQ(nullptr, read.ResponseMessage);
-}
-
-TEST_F(SerializerTest, ReceiveCallbackHandsOutTheBufferFromTheFront) {
-  std::unique_ptr<Serializer> serializer(new Serializer(false, false));
-  serializer->SetXML(VLString("ab\0d", 4));
-  char buf[10];
-  EXPECT_EQ(0u, Serializer::Serializer_frecv(serializer.get(), buf, 0));
-  EXPECT_EQ(2u, Serializer::Serializer_frecv(serializer.get(), buf, 2));
-  EXPECT_EQ("ab", std::string(buf, 2));
-  EXPECT_EQ(2u, Serializer::Serializer_frecv(serializer.get(), buf, 10));
-  EXPECT_EQ(std::string("\0d", 2), std::string(buf, 2));
-  EXPECT_EQ(0u, Serializer::Serializer_frecv(serializer.get(), buf, 10));
-  EXPECT_TRUE(serializer->GetXML().empty());
-
-  serializer->SetXML(VLString("abcd"));
-  EXPECT_EQ(4u, Serializer::Serializer_frecv(serializer.get(), buf, 10));
-  EXPECT_EQ(0u, Serializer::Serializer_frecv(serializer.get(), buf, 10));
-
-  EXPECT_EQ(SOAP_OK, Serializer::Serializer_fsend(serializer.get(), "x\0y", 3));
-  EXPECT_EQ(SOAP_OK, Serializer::Serializer_fsend(serializer.get(), "z", 1));
-  EXPECT_EQ(std::string("x\0yz", 4), Str(serializer->GetXML()));
-}
-
-TEST_F(SerializerTest, CallbacksOnAContextThatIsNoSerializerStop) {
-  char buf[4];
-  EXPECT_DEATH(Serializer::Serializer_fsend(m_Owner, "x", 1), "pSerializer != 0");
-  EXPECT_DEATH(Serializer::Serializer_frecv(m_Owner, buf, 4), "pSerializer != 0");
 }
 
 TEST_F(SerializerTest, DamagedCachedValuesLoadAsMisses) {

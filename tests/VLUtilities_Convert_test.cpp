@@ -273,13 +273,4 @@ TEST_F(Convert, StreamingLocation) {
   EXPECT_EQ(VL_WS_OK, VL_WS_release(&r));
 }
 
-TEST(ConvertDeathTest, NeedsTheSchemaRecord) {
-  GTEST_FLAG_SET(death_test_style, "threadsafe");
-  VL_WS_TitlesResponse r;
-  VLRecordInit(r);
-  EXPECT_DEATH(VLUtilities::VL1__GetTitlesResponse2VL_WS_TitlesResponse(nullptr, r), "t != 0");
-  EXPECT_DEATH(VLUtilities::VL1__ArrayOfTitleListing2VL_WS_TitleListingArray(nullptr, r.Titles), "t != 0");
-  VL_WS_release(&r);
-}
-
 }  // namespace

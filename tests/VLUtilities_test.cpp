@@ -1,4 +1,4 @@
-// Basic utilities: copies and conversions, URL encoding, bounded formatting, time texts, the hash
+// Basic utilities: URL encoding, bounded formatting, time texts, the hash
 // values other stored data depends on, random bytes and the device identifier.
 #include <gtest/gtest.h>
 
@@ -11,7 +11,6 @@
 #include <set>
 #include <string>
 
-#include "VLAutoCharPtr.h"
 #include "VLTestDir.h"
 #include "VLUtilities.h"
 
@@ -19,51 +18,8 @@ namespace {
 
 std::string Str(const VLString& s) { return std::string(s.c_str(), s.length()); }
 
-TEST(VLUtilities, StrDupAlwaysGivesAnOwnedText) {
-  const char* sources[] = {nullptr, "", "box art"};
-  const char* expected[] = {"", "", "box art"};
-  for (int i = 0; i < 3; ++i) {
-    char* copy = VLUtilities::StrDup(sources[i]);
-    ASSERT_NE(nullptr, copy);
-    EXPECT_NE(sources[i], copy);
-    EXPECT_STREQ(expected[i], copy);
-    delete[] copy;
-  }
-}
-
-TEST(VLUtilities, AutoCharPtrOwnsStrDupTexts) {
-  // The sanitizer build reports a leak or a double release here.
-  VLAutoCharPtr text(VLUtilities::StrDup("first"));
-  EXPECT_STREQ("first", text.get());
-  text.reset(VLUtilities::StrDup("second"));
-  EXPECT_STREQ("second", text.get());
-  text.reset(text.get());
-  EXPECT_STREQ("second", text.get());
-  char* kept = text.release();
-  EXPECT_EQ(nullptr, text.get());
-  text.reset(kept);
-  VLAutoCharPtr none;
-  EXPECT_EQ(nullptr, none.get());
-}
-
-TEST(VLUtilities, TextConversions) {
-  const struct {
-    const char* text;
-    bool value;
-  } bools[] = {{"true", true}, {"TRUE", true}, {"True", true}, {"1", false},
-               {"yes", false}, {"true ", false}, {"", false},   {nullptr, false}};
-  for (const auto& b : bools) EXPECT_EQ(b.value, VLUtilities::Str2Bool(b.text)) << (b.text ? b.text : "null");
-
-  for (int order = 0; order < 4; ++order)
-    EXPECT_EQ(order, VLUtilities::SortOrder2Int(static_cast<VL_WS_SortOrder>(order)));
-  EXPECT_EQ(0, VLUtilities::SortOrder2Int(static_cast<VL_WS_SortOrder>(4)));
-  EXPECT_EQ(0, VLUtilities::SortOrder2Int(static_cast<VL_WS_SortOrder>(-1)));
-}
-
 TEST(VLUtilities, URLEncodeEscapesAllButUnreservedBytes) {
-  EXPECT_EQ("abc-_.!~*'()", Str(VLUtilities::URLEncode("abc-_.!~*'()")));
-  EXPECT_EQ("AZaz09", Str(VLUtilities::URLEncode("AZaz09")));
-  EXPECT_EQ("a%20b", Str(VLUtilities::URLEncode("a b")));
+  EXPECT_EQ("AZaz09-_.!~*'()a%20b", Str(VLUtilities::URLEncode("AZaz09-_.!~*'()a b")));
   EXPECT_EQ("%2F%3F%26%3D%2B%25%09%0A", Str(VLUtilities::URLEncode("/?&=+%\t\n")));
   EXPECT_EQ("caf%E9", Str(VLUtilities::URLEncode("caf\xE9")));
   EXPECT_EQ("%C3%A9%FF%80%7F", Str(VLUtilities::URLEncode("\xC3\xA9\xFF\x80\x7F")));
@@ -88,9 +44,6 @@ TEST(VLUtilitiesDeathTest, SafeSnprintfPreconditions) {
   char buf[8];
   const char* pattern = "\\(buf != 0\\) && \\(format != 0\\) && \\(bufsize > 1\\)";
   EXPECT_DEATH(VLUtilities::safe_snprintf(buf, 1, "x"), pattern);
-  EXPECT_DEATH(VLUtilities::safe_snprintf(nullptr, 8, "x"), pattern);
-  const char* noFormat = nullptr;
-  EXPECT_DEATH(VLUtilities::safe_snprintf(buf, 8, noFormat), pattern);
 }
 
 TEST(VLUtilities, TimeTexts) {

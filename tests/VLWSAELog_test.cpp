@@ -1,5 +1,6 @@
 // Logging: lazy area registration, entry and exit trace, bounded formatting, and InitWSLogs with
-// its area masks, targets and return codes.
+// its area masks, targets and return codes. (The SOAP areas are seen at work in the raw-log tests
+// of the account operations.)
 #include <gtest/gtest.h>
 
 #include <string>
@@ -108,22 +109,6 @@ TEST_F(VLWSAELogTest, ScopeTraceLazyAreaAndBoundedFormatting) {
                                       "VL_WSAE:4:Exiting DUDUVudAE::getTitles", "VL_WSAE:4:url a%20b%s%n",
                                       "VL_WSAE:1:" + std::string(511, 'x')}),
             log.lines);
-}
-
-TEST_F(VLWSAELogTest, SoapAreasRegisterOnce) {
-  EXPECT_EQ(-1, RECV_VLLogAreaID);
-  soap_init_vl_log();
-  int recv = -1, sent = -1, test = -1;
-  VL_LogRegisterArea("soap_recv", &recv);
-  VL_LogRegisterArea("soap_sent", &sent);
-  VL_LogRegisterArea("soap_test", &test);
-  EXPECT_EQ(recv, RECV_VLLogAreaID);
-  EXPECT_EQ(sent, SENT_VLLogAreaID);
-  EXPECT_EQ(test, TEST_VLLogAreaID);
-  RECV_VLLogAreaID = -7;
-  soap_init_vl_log();
-  EXPECT_EQ(-7, RECV_VLLogAreaID);
-  RECV_VLLogAreaID = recv;
 }
 
 }  // namespace

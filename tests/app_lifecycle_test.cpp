@@ -109,29 +109,32 @@ TEST_F(Lifecycle, OnTerminateWithSpFlagSendsItsKeyAndPausesFirst) {
   }
 }
 
-TEST_F(Lifecycle, AFailingDrmStartIsReportedAndRegistrationGoesOn) {
-  VL_PlatformSetServiceResult(VL_SERVICE_DRM_INIT, 5);
-  std::string out = RunLifecycle(&launcher);
-  EXPECT_NE(std::string::npos,
-            out.find(Trace("init", 99) + "\n[VL_FLASH] Ipriv_drm_Init fail.ret = 5 \n[VL_FLASH] Init network ipc \n"));
-  EXPECT_EQ(3u, stage.ClassIds().size());
-}
-
-TEST_F(Lifecycle, AFailingNetworkQueueLeavesEveryClassUnregistered) {
-  VL_PlatformSetServiceResult(VL_SERVICE_NET_INIT, 1);
-  std::string out = RunLifecycle(&launcher);
-  EXPECT_NE(std::string::npos,
-            out.find("[VL_FLASH] Init network ipc \n[VL_FLASH] init_network_msg_queue Error \n" +
-                     Trace("onTerminate", 133)));
-  EXPECT_TRUE(stage.ClassIds().empty());
-  EXPECT_EQ(2u, stage.Keys().size());
-  EXPECT_FALSE(stage.Evaluate("movie.js", "newExtension('com.ostrel.VLPlayerLibAE');"));
-}
-
-TEST_F(Lifecycle, AFailingDrmStopIsReportedAndDestructionCompletes) {
-  VL_PlatformSetServiceResult(VL_SERVICE_DRM_TERMINATE, -2);
-  std::string out = RunLifecycle(&launcher);
-  EXPECT_NE(std::string::npos, out.find("[VL_FLASH] Uninit network ipc \n\n[VL_FLASH] Ipriv_drm_Terminate fail.ret = -2 \n"));
+// A failing DRM start or stop is reported and the rest goes on; a failing network queue leaves
+// every class unregistered.
+TEST_F(Lifecycle, FailingServicesAreReported) {
+  const struct {
+    VL_PlatformService service;
+    int result;
+    std::string printed;
+    size_t classes;
+  } cases[] = {
+      {VL_SERVICE_DRM_INIT, 5,
+       Trace("init", 99) + "\n[VL_FLASH] Ipriv_drm_Init fail.ret = 5 \n[VL_FLASH] Init network ipc \n", 3},
+      {VL_SERVICE_NET_INIT, 1,
+       "[VL_FLASH] Init network ipc \n[VL_FLASH] init_network_msg_queue Error \n" + Trace("onTerminate", 133), 0},
+      {VL_SERVICE_DRM_TERMINATE, -2, "[VL_FLASH] Uninit network ipc \n\n[VL_FLASH] Ipriv_drm_Terminate fail.ret = -2 \n", 3},
+  };
+  for (const auto& c : cases) {
+    vlplatform::Stage own(1);
+    vlplatform::Launcher with(&own);
+    VL_PlatformResetServices();
+    VL_PlatformSetServiceResult(c.service, c.result);
+    std::string out = RunLifecycle(&with);
+    EXPECT_NE(std::string::npos, out.find(c.printed)) << out;
+    EXPECT_EQ(c.classes, own.ClassIds().size());
+    EXPECT_EQ(2u, own.Keys().size());
+    if (c.classes == 0) EXPECT_FALSE(own.Evaluate("movie.js", "newExtension('com.ostrel.VLPlayerLibAE');"));
+  }
 }
 
 TEST_F(Lifecycle, KeyFilterLetsEveryKeyThroughAndEventsAreIgnored) {

@@ -1,7 +1,8 @@
-// The script engine behind the stage, seen from an extension class as the store's classes see
-// it: construction by class id, method calls, kept references across garbage collections,
-// OnUpdate delivery, value factories ("Date", "Object", "push"), callbacks ("onComplete"),
-// destruction, script errors and the movie's end.
+// The script engine behind the stage, where a lax stand-in would hide a fault of the store's
+// classes: a reference kept beyond a call survives garbage collection only while kept, OnUpdate
+// runs on the engine's thread, instances are destructed when collected or at the close, handles
+// are for the engine's thread only, an error in a callback ends the movie, arrays are told from
+// other objects, and values convert as the script language converts them.
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -29,36 +30,20 @@ class Probe : public ASExtensionClass {
   static const char* GetClassName() { return "test.Probe"; }
   static bool FiresEvents() { return false; }
   static void GetMethods(AEArray<Method>& table) {
-    static const Method kMethods[] = {
-        Method::Bind("describe", &Probe::describe),   Method::Bind("keep", &Probe::keep),
-        Method::Bind("release", &Probe::release),     Method::Bind("completeAfter", &Probe::completeAfter),
-        Method::Bind("makeDate", &Probe::makeDate),   Method::Bind("fill", &Probe::fill),
-        Method::Bind("read", &Probe::read),           Method::Bind("isInstance", &Probe::isInstance),
-        Method::Bind("quitMovie", &Probe::quitMovie), Method::Bind("label", &Probe::label),
-    };
+    static const Method kMethods[] = {Method::Bind("keep", &Probe::keep), Method::Bind("release", &Probe::release),
+                                      Method::Bind("completeAfter", &Probe::completeAfter),
+                                      Method::Bind("isInstance", &Probe::isInstance)};
     table.Append(kMethods, sizeof kMethods / sizeof kMethods[0]);
   }
-  static ASExtensionClass* ConstructInstance(StageWindow*, ASObject&, ASValueArray& arguments) {
+  static ASExtensionClass* ConstructInstance(StageWindow*, ASObject&, ASValueArray&) {
     ++s_Constructed;
-    Probe* probe = new Probe;
-    probe->m_Label = arguments.Get(0).AsString();
-    return probe;
+    return new Probe;
   }
   static void DestructInstance(StageWindow*, ASObject& object) {
     ++s_Destructed;
     delete object.GetNativeInstance();
   }
 
-  // describe(...values): "<count>|" then "<kind>,<integer>,<boolean>,<string>;" per value
-  void describe(StageWindow*, ASObject&, ASValueArray& arguments, ASValue& result) {
-    std::string text = std::to_string(arguments.Count()) + "|";
-    for (size_t i = 0; i < arguments.Count(); ++i) {
-      const ASValue& v = arguments.Get(i);
-      text += std::to_string(v.GetKind()) + "," + std::to_string(v.AsInteger()) + "," +
-              (v.AsBoolean() ? "true" : "false") + "," + v.AsString().CString() + ";";
-    }
-    result.SetString(text.c_str());
-  }
   // keep(callback): keeps a reference beyond the call
   void keep(StageWindow*, ASObject&, ASValueArray& arguments, ASValue& result) {
     m_Kept = arguments.Get(0).AsObject();
@@ -81,37 +66,12 @@ class Probe : public ASExtensionClass {
     m_Kept.CallMethod("onComplete", status, text);
     m_Kept.Release();
   }
-  // makeDate(year, month, day, hours, minutes, seconds)
-  void makeDate(StageWindow*, ASObject& object, ASValueArray& arguments, ASValue& result) {
-    result.SetObject(object.NewObject("Date", arguments));
-  }
-  // fill(array, n): pushes n new objects {index: i} onto the array
-  void fill(StageWindow*, ASObject& object, ASValueArray& arguments, ASValue& result) {
-    ASObject array = arguments.Get(0).AsObject();
-    bool ok = array.IsInstanceOf("Array");
-    for (int i = 0; i < arguments.Get(1).AsInteger(); ++i) {
-      ASObject element = object.NewObject("Object");
-      ASValue index, value;
-      index.SetInteger(i);
-      ok = element.SetProperty("index", index) && ok;
-      value.SetObject(element);
-      ok = array.CallMethod("push", value) && ok;
-    }
-    result.SetBoolean(ok);
-  }
-  // read(object, name)
-  void read(StageWindow*, ASObject&, ASValueArray& arguments, ASValue& result) {
-    result = arguments.Get(0).AsObject().GetProperty(arguments.Get(1).AsString().CString());
-  }
-  // isInstance(object, className)
+  // isInstance(object, className): the store's classes tell an Array argument from other objects
   void isInstance(StageWindow*, ASObject&, ASValueArray& arguments, ASValue& result) {
     result.SetBoolean(arguments.Get(0).AsObject().IsInstanceOf(arguments.Get(1).AsString().CString()));
   }
-  void quitMovie(StageWindow* window, ASObject&, ASValueArray&, ASValue&) { window->Quit(); }
-  void label(StageWindow*, ASObject&, ASValueArray&, ASValue& result) { result.SetString(m_Label); }
 
  private:
-  AEString m_Label;
   ASObject m_Kept;
   int m_Frames = 0;
   int m_Status = 0;
@@ -138,21 +98,6 @@ class Engine : public testing::Test {
   vlplatform::Stage stage;
 };
 
-TEST_F(Engine, ExtensionObjectsAreMadeByClassIdAndTheirMethodsGetArgumentsAndReturnValues) {
-  Play(
-      "var p = newExtension('test.Probe', 'first');"
-      "var d = p.describe(12, '0x1F', ' 7 ', 2.9, -2.9, true, null, undefined, {}, [1, 2], 'abc');"
-      "var l = p.label();"
-      "var none = p.release();");
-  EXPECT_EQ(1, Probe::s_Constructed);
-  EXPECT_EQ("first", Text("l"));
-  EXPECT_EQ(
-      "11|3,12,true,12;4,31,true,0x1F;4,7,true, 7 ;3,2,true,2.9;3,-2,true,-2.9;2,1,true,true;"
-      "1,0,false,;0,0,false,;5,0,true,[object Object];5,0,true,1,2;4,0,true,abc;",
-      Text("d"));
-  EXPECT_TRUE(stage.Global().GetProperty("none").IsUndefined());
-}
-
 TEST_F(Engine, KeptReferenceSurvivesGarbageCollectionUntilReleased) {
   Play(
       "var p = newExtension('test.Probe');"
@@ -170,42 +115,6 @@ TEST_F(Engine, KeptReferenceSurvivesGarbageCollectionUntilReleased) {
   EXPECT_EQ(std::this_thread::get_id(), Probe::s_UpdateThread);
   ASSERT_TRUE(stage.Evaluate("gc.js", "Duktape.gc(); Duktape.gc();"));
   EXPECT_TRUE(stage.Global().GetProperty("collected").AsBoolean());
-}
-
-TEST_F(Engine, OnUpdateRunsEveryFrameWhileRequestedAndTheMovieEndsWhenNothingIsLeft) {
-  Play(
-      "var frames = 0, done = 0;"
-      "var p = newExtension('test.Probe');"
-      "p.keep({ onComplete: function () { done = frames; } });"
-      "p.completeAfter(4, 0);"
-      "onEnterFrame = function () { ++frames; if (done) onEnterFrame = null; };");
-  // OnUpdate follows onEnterFrame in each frame: the fourth update is in the fourth frame.
-  EXPECT_EQ(4, stage.Global().GetProperty("done").AsInteger());
-  EXPECT_EQ(5, stage.Global().GetProperty("frames").AsInteger());
-  EXPECT_FALSE(stage.Ended());
-}
-
-TEST_F(Engine, FactoriesMakeDatesObjectsAndPushOntoArrays) {
-  Play(
-      "var p = newExtension('test.Probe');"
-      "var d = p.makeDate(2011, 0, 2, 3, 4, 5);"
-      "var date = [d instanceof Date, d.getFullYear(), d.getMonth(), d.getDate(),"
-      "            d.getHours(), d.getMinutes(), d.getSeconds()].join(' ');"
-      "var zero = p.makeDate(0, -1, 0, 0, 0, 0);"
-      "var zeroDate = zero instanceof Date && !isNaN(zero.getTime());"
-      "var list = ['existing'];"
-      "var filled = p.fill(list, 3);"
-      "var listed = list.length + ' ' + list[0] + ' ' + list[3].index;"
-      "var kinds = [p.isInstance([], 'Array'), p.isInstance({}, 'Array'), p.isInstance(d, 'Date'),"
-      "             p.isInstance(p, 'test.Probe'), p.isInstance({}, 'test.Probe'),"
-      "             p.isInstance({}, 'NoSuchClass')].join(' ');"
-      "var property = p.read({ a: 'x' }, 'a') + p.read({}, 'missing');");
-  EXPECT_EQ("true 2011 0 2 3 4 5", Text("date"));
-  EXPECT_TRUE(stage.Global().GetProperty("zeroDate").AsBoolean());
-  EXPECT_TRUE(stage.Global().GetProperty("filled").AsBoolean());
-  EXPECT_EQ("4 existing 2", Text("listed"));
-  EXPECT_EQ("true false true true false false", Text("kinds"));
-  EXPECT_EQ("xundefined", Text("property"));
 }
 
 // An instance that keeps its own object is not collected, and is destructed once at the close.
@@ -239,37 +148,12 @@ TEST_F(Engine, AnErrorInACallbackIsTheMoviesErrorAndEndsIt) {
   EXPECT_NE(std::string::npos, stage.Error().find("callback failed")) << stage.Error();
 }
 
-TEST_F(Engine, ScriptErrorsAndMisuseAreReported) {
+TEST_F(Engine, ArraysAreToldFromOtherObjects) {
   Play(
       "var p = newExtension('test.Probe');"
-      "var misuse = '';"
-      "try { p.label.call({}); } catch (e) { misuse = e.name; }");
-  EXPECT_EQ("TypeError", Text("misuse"));
-  EXPECT_FALSE(stage.Evaluate("unknown.js", "newExtension('no.such.Class');"));
-  EXPECT_NE(std::string::npos, stage.Error().find("no extension class is registered as \"no.such.Class\""));
-  EXPECT_EQ(1, stage.ExitStatus());
-}
-
-TEST_F(Engine, QuitAndExitEndTheMovie) {
-  Play("var p = newExtension('test.Probe'); onEnterFrame = function () { p.quitMovie(); };");
-  EXPECT_TRUE(stage.Ended());
-  EXPECT_EQ(0, stage.ExitStatus());
-
-  vlplatform::Stage other(1);
-  EXPECT_TRUE(other.Evaluate("exit.js", "var n = 0; onEnterFrame = function () { if (++n == 3) exit(4); };"));
-  other.RunFrames();
-  EXPECT_EQ(4, other.ExitStatus());
-  EXPECT_EQ(3, other.Global().GetProperty("n").AsInteger());
-}
-
-TEST_F(Engine, RegistrationRejectsDuplicatesAndIncompleteDescriptors) {
-  EXPECT_EQ(AEError_Usage, stage.RegisterExtensionClass(ae::stagecraft::DescribeExtensionClass<Probe>()));
-  ae::stagecraft::ASExtensionClassDescriptor incomplete = ae::stagecraft::DescribeExtensionClass<Probe>();
-  incomplete.DestructInstance = nullptr;
-  EXPECT_EQ(AEError_InvalidParameters, stage.RegisterExtensionClass(incomplete));
-  EXPECT_EQ(std::vector<std::string>{"test.Probe"}, stage.ClassIds());
-  EXPECT_NE(nullptr, stage.FindClass("test.Probe"));
-  EXPECT_EQ(nullptr, stage.FindClass("other"));
+      "var kinds = [p.isInstance([], 'Array'), p.isInstance({}, 'Array'), p.isInstance(p, 'test.Probe'),"
+      "             p.isInstance({}, 'test.Probe')].join(' ');");
+  EXPECT_EQ("true false true false", Text("kinds"));
 }
 
 TEST(EngineDeathTest, HandlesAreForTheEnginesThreadOnly) {
@@ -303,13 +187,8 @@ TEST(ScriptValue, ConvertsLikeTheScriptLanguage) {
     v.SetString(t.text);
     EXPECT_EQ(t.integer, v.AsInteger()) << t.text;
   }
-  v.SetString("-Infinity");
-  EXPECT_TRUE(std::isinf(v.AsNumber()));
-  v.SetString("");
-  EXPECT_FALSE(v.AsBoolean());
   v.SetBoolean(true);
   EXPECT_EQ(1, v.AsInteger());
-  EXPECT_FALSE(v.AsObject().IsValid());
   ASValueArray arguments;
   EXPECT_TRUE(arguments.Get(3).IsUndefined());
 }

@@ -8,7 +8,6 @@
 #include <strings.h>
 #include <sys/socket.h>
 #include <unistd.h>
-#include <zlib.h>
 
 #include <gtest/gtest.h>
 
@@ -222,21 +221,6 @@ std::string VLTestServer::Envelope(const std::string& bodyContent) {
          "<SOAP-ENV:Envelope xmlns:SOAP-ENV=\"http://schemas.xmlsoap.org/soap/envelope/\" "
          "xmlns:VL1=\"" VL_API_NAMESPACE "\"><SOAP-ENV:Body>" +
          bodyContent + "</SOAP-ENV:Body></SOAP-ENV:Envelope>";
-}
-
-std::string VLTestServer::Gzip(const std::string& text) {
-  z_stream z;
-  memset(&z, 0, sizeof(z));
-  deflateInit2(&z, Z_DEFAULT_COMPRESSION, Z_DEFLATED, 16 + MAX_WBITS, 8, Z_DEFAULT_STRATEGY);
-  std::string out(deflateBound(&z, text.size()) + 32, '\0');
-  z.next_in = reinterpret_cast<Bytef*>(const_cast<char*>(text.data()));
-  z.avail_in = static_cast<uInt>(text.size());
-  z.next_out = reinterpret_cast<Bytef*>(&out[0]);
-  z.avail_out = static_cast<uInt>(out.size());
-  deflate(&z, Z_FINISH);
-  out.resize(z.total_out);
-  deflateEnd(&z);
-  return out;
 }
 
 void VLTestFillParams(VL_WS_SetupParams2* params, const std::string& serviceBaseURL) {

@@ -80,8 +80,6 @@ class VLTestServer {
                                const std::string& extraHeaders = "");
   // A SOAP 1.1 envelope around body content, declaring SOAP-ENV and VL1.
   static std::string Envelope(const std::string& bodyContent);
-  // gzip stream of text.
-  static std::string Gzip(const std::string& text);
 
  private:
   void Serve();
