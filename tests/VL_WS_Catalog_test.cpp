@@ -1,11 +1,10 @@
-// Catalogue operations against the store simulator: their records checked against the store's
-// data, the cache in front of them (Names, Keys, what is kept and what is not), transport faults
+// Catalogue operations against the store simulator (what their records hold, vlws_test pins):
+// the cache in front of them (Names, Keys, what is kept and what is not), transport faults
 // and response codes, the wishlist flags of title answers, and the cache's refresh.
 #include <gtest/gtest.h>
 #include <string.h>
 #include <sys/stat.h>
 
-#include <algorithm>
 #include <chrono>
 #include <functional>
 #include <string>
@@ -18,106 +17,7 @@
 
 namespace {
 
-// ---- The store's data as the client records must show it ----
-
 const VLSimCatalogue& Catalogue() { return VLTestSimulator().Catalogue(); }
-
-void ExpectProduct(const VL_WS_ProductListing& r, const VLSimProduct& p) {
-  SCOPED_TRACE("SKU " + std::to_string(p.sku));
-  ASSERT_NE(nullptr, r.tag);
-  EXPECT_EQ(VL_WS_TAG_PRODUCT_LISTING, *r.tag);
-  EXPECT_EQ(p.sku, r.SkuID);
-  EXPECT_EQ(p.purchaseType, r.PurchaseType);
-  EXPECT_STREQ(p.price.c_str(), r.Price);
-  EXPECT_EQ(p.rentalHours, r.RentalPeriod);
-  // The store sends plain dates, which are no XML date-time: the all-zero time (the conversion's
-  // own tests have the formats).
-  EXPECT_STREQ("1900/01/00 00:00:00", r.ExpireDate) << p.expireDate;
-  ASSERT_EQ(static_cast<int>(p.profiles.size()), r.AvailableAssets.Count);
-  for (int i = 0; i < r.AvailableAssets.Count; ++i) EXPECT_EQ(p.profiles[i], r.AvailableAssets.Items[i]);
-  ASSERT_EQ(static_cast<int>(p.audio.size()), r.AvailableAudioProfiles.Count);
-  for (int i = 0; i < r.AvailableAudioProfiles.Count; ++i) {
-    const VL_WS_AudioFile& a = r.AvailableAudioProfiles.Items[i];
-    EXPECT_EQ(VL_WS_TAG_AUDIO_FILE, *a.tag);
-    EXPECT_EQ(p.sku * 10 + i, a.AssetAudioID);
-    EXPECT_EQ("https://store.ostrel.example/media/audio/" + std::to_string(a.AssetAudioID) + ".mp4", a.FileLocation);
-    EXPECT_EQ(i == 0, a.ContainsVideo);
-    EXPECT_EQ(p.audio[i], a.AudioAssetProfile);
-  }
-}
-
-// The title fields of a listing of title t (or of its episode e).
-void ExpectTitle(const VL_WS_TitleListing& r, const VLSimTitle& t, const VLSimEpisode* e = nullptr) {
-  SCOPED_TRACE("title " + std::to_string(t.id));
-  ASSERT_NE(nullptr, r.tag);
-  EXPECT_EQ(t.id, r.TitleID);
-  EXPECT_STREQ(e ? (t.name + ": " + e->name).c_str() : t.name.c_str(), r.TitleName);
-  EXPECT_STREQ(t.boxArt.c_str(), r.BoxArtPrefix);
-  EXPECT_EQ(e ? e->number : 0, r.EpisodeNumber);
-  EXPECT_EQ(t.tv, r.IsTvListing);
-  EXPECT_STREQ(t.mpaa.c_str(), r.MPAARating);
-  EXPECT_STREQ(t.chvrs.c_str(), r.CHVRSRating);
-  EXPECT_EQ(t.thx, r.IsTHXMediaDirectorEnabled);
-  EXPECT_EQ(t.thxTrailer, r.IsTHXMediaDirectorEnabledForTrailer);
-  EXPECT_STREQ(t.loyaltyBuy.c_str(), r.LoyaltyPointsForBuy);
-  EXPECT_STREQ(t.loyaltyRent.c_str(), r.LoyaltyPointsForRent);
-  EXPECT_EQ(VL_WS_TAG_BONUS_ASSET_ARRAY, *r.BonusAssets.tag);
-  ASSERT_EQ(static_cast<int>(t.bonus.size()), r.BonusAssets.Count);
-  for (int i = 0; i < r.BonusAssets.Count; ++i) {
-    const VLSimBonus* b = Catalogue().FindBonus(t.bonus[i]);
-    EXPECT_EQ(b->id, r.BonusAssets.Items[i].BonusAssetID);
-    EXPECT_EQ(b->profile, r.BonusAssets.Items[i].Profile);
-    EXPECT_EQ(b->type, r.BonusAssets.Items[i].BonusType);
-  }
-  const std::vector<int>& skus = e ? e->products : t.products;
-  EXPECT_EQ(VL_WS_TAG_PRODUCT_LISTING_ARRAY, *r.AvailableProducts.tag);
-  ASSERT_EQ(static_cast<int>(skus.size()), r.AvailableProducts.Count);
-  for (size_t i = 0; i < skus.size(); ++i)
-    ExpectProduct(r.AvailableProducts.Items[i], *Catalogue().FindProduct(skus[i]));
-}
-
-// The titles of a list, the first of them at position first + 1.
-void ExpectTitles(const VL_WS_TitleListingArray& r, const std::vector<const VLSimTitle*>& titles, int first = 0) {
-  EXPECT_EQ(VL_WS_TAG_TITLE_LISTING_ARRAY, *r.tag);
-  ASSERT_EQ(static_cast<int>(titles.size()), r.Count);
-  for (int i = 0; i < r.Count; ++i) {
-    ExpectTitle(r.Items[i], *titles[i]);
-    EXPECT_EQ(first + i + 1, r.Items[i].TitlePosition);
-  }
-}
-
-// A page of the titles all (in store order), page and size as asked.
-void ExpectPage(const VL_WS_TitlesResponse& r, const std::vector<const VLSimTitle*>& all, int genre, int page,
-                int perPage) {
-  EXPECT_EQ(VL_WS_TAG_TITLES_RESPONSE, *r.tag);
-  EXPECT_EQ(0, r.ResponseCode);
-  EXPECT_STREQ("OK", r.ResponseMessage);
-  EXPECT_EQ(genre, r.GenreID);
-  EXPECT_EQ(page, r.CurrentPageNumber);
-  EXPECT_EQ(perPage, r.ItemsPerPage);
-  EXPECT_EQ(static_cast<int>(all.size()), r.TotalItems);
-  EXPECT_EQ((static_cast<int>(all.size()) + perPage - 1) / perPage, r.TotalPages);
-  int first = std::min((page - 1) * perPage, static_cast<int>(all.size()));
-  int last = std::min(first + perPage, static_cast<int>(all.size()));
-  ExpectTitles(r.Titles, std::vector<const VLSimTitle*>(all.begin() + first, all.begin() + last), first);
-}
-
-// The details of title t (or of its episode e).
-void ExpectDetails(const VL_WS_TitleListingResponse& r, const VLSimTitle& t, const VLSimEpisode* e = nullptr) {
-  EXPECT_EQ(VL_WS_TAG_TITLE_LISTING_RESPONSE, *r.tag);
-  ExpectTitle(r, t, e);
-  EXPECT_EQ(0, r.ResponseCode);
-  EXPECT_STREQ("OK", r.ResponseMessage);
-  EXPECT_STREQ(t.synopsis.c_str(), r.Synopsys);
-  EXPECT_EQ(t.userRating, r.UserRating);
-  EXPECT_STREQ(t.directors.c_str(), r.Directors);
-  EXPECT_STREQ(t.actors.c_str(), r.Actors);
-  EXPECT_STREQ(t.writers.c_str(), r.Writers);
-  EXPECT_STREQ(t.producers.c_str(), r.Producers);
-  EXPECT_STREQ(t.copyright.c_str(), r.Copyright);
-  EXPECT_STREQ(t.runtime.c_str(), r.RunTime);
-  EXPECT_STREQ(t.ratingReason.c_str(), r.RatingReason);
-}
 
 // Checks that an answer record carries its own tag, then releases it.
 template <class Record>
@@ -210,9 +110,7 @@ class Catalog : public VLTestAccountClient {
 
 const std::vector<std::string> kOne = {"getTitlesByNavigation"};
 
-TEST_F(Catalog, TitlesPageShowsTheStoresTitlesAndIsKeptPerPageSize) {
-  std::vector<const VLSimTitle*> movies = Catalogue().TitlesInGenre(1);
-  ASSERT_GT(movies.size(), 7u);
+TEST_F(Catalog, TitlesPageIsKeptPerPageSize) {
   VL_WS_TitlesResponse first, second, other;
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitles(&m_Handle, 1, 2, 4, 2, &first));
   EXPECT_EQ(kOne, Sent(1));
@@ -221,9 +119,9 @@ TEST_F(Catalog, TitlesPageShowsTheStoresTitlesAndIsKeptPerPageSize) {
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitles(&m_Handle, 1, 2, 4, 2, &second));
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitles(&m_Handle, 1, 2, 5, 2, &other));
   EXPECT_EQ(kOne, Sent(1));  // the page size makes another request; the same page none
-  ExpectPage(first, movies, 1, 2, 4);
-  ExpectPage(second, movies, 1, 2, 4);
-  ExpectPage(other, movies, 1, 2, 5);
+  EXPECT_EQ(5, first.Titles.Items[0].TitlePosition);
+  EXPECT_EQ(5, second.Titles.Items[0].TitlePosition);
+  EXPECT_EQ(6, other.Titles.Items[0].TitlePosition);
   EXPECT_TRUE(Cached("getTitles", "1,2,5,2"));
   for (VL_WS_TitlesResponse* page : {&first, &second, &other}) EXPECT_EQ(VL_WS_OK, VL_WS_release(page));
 
@@ -236,27 +134,6 @@ TEST_F(Catalog, TitlesPageShowsTheStoresTitlesAndIsKeptPerPageSize) {
   VL_WS_release(&first);
 }
 
-TEST_F(Catalog, TitlesPageWithAResponseCodeIsFoldedAndNotCached) {
-  Fault("getTitlesByNavigation=code:5,times=1");
-  VL_WS_TitlesResponse page;
-  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getTitles(&m_Handle, 1, 1, 5, 2, &page));
-  EXPECT_EQ(5, page.ResponseCode);
-  EXPECT_STREQ("Response code injected by the simulator", page.ResponseMessage);
-  EXPECT_EQ(5, page.Titles.Count);  // the rest of the answer is there
-  VL_WS_release(&page);
-  EXPECT_FALSE(Cached("getTitles", "1,1,5,2"));
-
-  // The store's own refusals too: an unknown genre.
-  EXPECT_EQ(VL_WS_E_UNEXPECTED, VL_WS_getTitles(&m_Handle, 999, 1, 5, 2, &page));
-  EXPECT_EQ(2, page.ResponseCode);
-  VL_WS_release(&page);
-  EXPECT_FALSE(Cached("getTitles", "999,1,5,2"));
-  Sent(2);
-
-  EXPECT_EQ(VL_WS_OK, FetchTitles());
-  EXPECT_EQ(kOne, Sent(1));
-}
-
 TEST_F(Catalog, UnreadableCachedAnswerIsAMissAndIsReplaced) {
   // Not a stored record at all, and a stored response without its result element.
   _VL1__getTitlesByNavigationResponse empty;
@@ -267,7 +144,7 @@ TEST_F(Catalog, UnreadableCachedAnswerIsAMissAndIsReplaced) {
     VL_WS_TitlesResponse page;
     ASSERT_EQ(VL_WS_OK, VL_WS_getTitles(&m_Handle, 1, 1, 5, 2, &page));
     EXPECT_EQ(kOne, Sent(1));
-    ExpectPage(page, Catalogue().TitlesInGenre(1), 1, 1, 5);
+    EXPECT_EQ(5, page.Titles.Count);
     VL_WS_release(&page);
     VLString value;
     ASSERT_TRUE(Cache().ReadMetaData("getTitles", "1,1,5,2", value));
@@ -313,33 +190,20 @@ TEST_F(Catalog, PagesBeyondSixteenBitsAreRefusedBeforeAnyRequest) {
   EXPECT_EQ(VL_WS_OK, FetchTitles(32767));
 }
 
-TEST_F(Catalog, NavigationIsTheStoresGenreTreeKeptUnderTheEmptyKeyAndGenreLabelsFoldTheirCode) {
-  const std::vector<VLSimGenre>& all = Catalogue().Genres();
+TEST_F(Catalog, NavigationIsKeptUnderTheEmptyKeyAndGenreLabelsFoldTheirCode) {
   VL_WS_GenreArray genres;
   for (int round = 0; round < 2; ++round) {
     ASSERT_EQ(VL_WS_OK, VL_WS_getNavigation(&m_Handle, &genres));
-    EXPECT_EQ(VL_WS_TAG_GENRE_ARRAY, *genres.tag);
-    ASSERT_EQ(static_cast<int>(all.size()), genres.Count);
-    for (int i = 0; i < genres.Count; ++i) {
-      EXPECT_EQ(VL_WS_TAG_GENRE, *genres.Items[i].tag);
-      EXPECT_EQ(all[i].id, genres.Items[i].ID);
-      EXPECT_STREQ(all[i].name.c_str(), genres.Items[i].Name);
-      EXPECT_EQ(all[i].visible, genres.Items[i].Visible);
-      EXPECT_EQ(all[i].parent, genres.Items[i].ParentId);
-    }
-    VL_WS_release(&genres);
+    EXPECT_EQ(static_cast<int>(Catalogue().Genres().size()), genres.Count);
+    EXPECT_EQ(VL_WS_TAG_GENRE, *genres.Items[0].tag);
+    ExpectTaggedAndRelease(genres);
     EXPECT_TRUE(Cached("getNavigation", ""));
   }
 
   // A genre's label is never kept.
-  const VLSimGenre* genre = Catalogue().FindGenre(10);
   VL_WS_GenreLabelResponse label;
   for (int round = 0; round < 2; ++round) {
     ASSERT_EQ(VL_WS_OK, VL_WS_getGenreLabel(&m_Handle, 10, &label));
-    EXPECT_EQ(0, label.ResponseCode);
-    EXPECT_STREQ("OK", label.ResponseMessage);
-    EXPECT_STREQ(genre->name.c_str(), label.Label);
-    EXPECT_STREQ(genre->labelMessage.c_str(), label.LabelMessage);
     ExpectTaggedAndRelease(label);
   }
   EXPECT_EQ((std::vector<std::string>{"getNavigation", "getGenreLabel", "getGenreLabel"}), Sent(3));
@@ -357,11 +221,12 @@ TEST_F(Catalog, TitlesByGenreIDsGivesOnePagePerGenreAndIsNeverKept) {
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitlesByGenreIDs(&m_Handle, 3, ids, 1, 3, 2, &pages));
   EXPECT_EQ(VL_WS_TAG_TITLES_RESPONSE_ARRAY, *pages.tag);
   ASSERT_EQ(3, pages.Count);
-  ExpectPage(pages.Items[0], Catalogue().TitlesInGenre(10), 10, 1, 3);
+  EXPECT_EQ(10, pages.Items[0].GenreID);
   EXPECT_EQ(VL_WS_TAG_TITLES_RESPONSE, *pages.Items[1].tag);
   EXPECT_EQ(2, pages.Items[1].ResponseCode);  // an unknown genre's page; the status is the call's
   EXPECT_EQ(999, pages.Items[1].GenreID);
-  ExpectPage(pages.Items[2], Catalogue().TitlesInGenre(2), 2, 1, 3);
+  EXPECT_EQ(2, pages.Items[2].GenreID);
+  EXPECT_EQ(0, pages.Items[2].ResponseCode);
   VL_WS_release(&pages);
 
   // A count below 1 or no IDs: refused, untouched by the store.
@@ -383,7 +248,6 @@ TEST_F(Catalog, TitleListingIsKeptWithItsWishlistFlagWhichTheCacheDoesNotRewrite
   m_Sim.Store().WishlistAdd(Account(), 1002);
   VL_WS_TitleListingResponse details;
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitleListing(&m_Handle, 1002, &details));
-  ExpectDetails(details, *Catalogue().FindTitle(1002));
   VL_WS_release(&details);
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitleListing(&m_Handle, 1003, &details));
   VL_WS_release(&details);
@@ -395,8 +259,11 @@ TEST_F(Catalog, TitleListingIsKeptWithItsWishlistFlagWhichTheCacheDoesNotRewrite
   // Answered by the cache: the flag stays as the cache has it.
   ASSERT_TRUE(Cache().WriteWishlistFlag(1002, false));
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitleListing(&m_Handle, 1002, &details));
-  ExpectDetails(details, *Catalogue().FindTitle(1002));
-  VL_WS_release(&details);
+  const VLSimTitle& title = *Catalogue().FindTitle(1002);  // the cache keeps the details too
+  EXPECT_STREQ(title.synopsis.c_str(), details.Synopsys);
+  EXPECT_STREQ(title.ratingReason.c_str(), details.RatingReason);
+  EXPECT_EQ(static_cast<int>(title.products.size()), details.AvailableProducts.Count);
+  ExpectTaggedAndRelease(details);
   EXPECT_EQ(0, Flag(1002));
 
   // An unknown title: folded, and neither the answer nor a flag is kept.
@@ -422,8 +289,8 @@ TEST_F(Catalog, EpisodeListingIsKeptWithTheSeriesWishlistFlag) {
   VL_WS_TitleListingResponse details;
   for (int round = 0; round < 2; ++round) {
     ASSERT_EQ(VL_WS_OK, VL_WS_getTvEpisodeListing(&m_Handle, 50002, &details));
-    ExpectDetails(details, *Catalogue().FindTitle(1151), Catalogue().FindEpisode(50002));
-    VL_WS_release(&details);
+    EXPECT_STREQ("Harbor Lights: Episode 2: Iron Island", details.TitleName);
+    ExpectTaggedAndRelease(details);
   }
   EXPECT_TRUE(Cached("getTvEpisodeListing", "50002"));
   EXPECT_EQ(1, Flag(1151));
@@ -441,16 +308,7 @@ TEST_F(Catalog, EpisodeListOfASeriesIsKeptAndAMovieHasNone) {
   VL_WS_TvEpisodeListResponse list;
   for (int round = 0; round < 2; ++round) {
     ASSERT_EQ(VL_WS_OK, VL_WS_getTvEpisodeListByTitleID(&m_Handle, 1152, &list));
-    EXPECT_EQ(0, list.ResponseCode);
-    EXPECT_EQ(VL_WS_TAG_TV_EPISODE_ARRAY, *list.Episodes.tag);
-    ASSERT_EQ(static_cast<int>(series->episodes.size()), list.Episodes.Count);
-    for (int i = 0; i < list.Episodes.Count; ++i) {
-      const VLSimEpisode* e = Catalogue().FindEpisode(series->episodes[i]);
-      EXPECT_EQ(VL_WS_TAG_TV_EPISODE, *list.Episodes.Items[i].tag);
-      EXPECT_EQ(e->id, list.Episodes.Items[i].EpisodeID);
-      EXPECT_STREQ(e->name.c_str(), list.Episodes.Items[i].EpisodeName);
-      EXPECT_EQ(e->number, list.Episodes.Items[i].EpisodeNumber);
-    }
+    EXPECT_EQ(static_cast<int>(series->episodes.size()), list.Episodes.Count);
     ExpectTaggedAndRelease(list);
   }
   EXPECT_TRUE(Cached("getTvEpisodeListByTitleID", "1152"));
@@ -471,8 +329,7 @@ TEST_F(Catalog, AllEpisodeListingsAreKeptWithEveryWishlistFlagWhenThereAreAnyAnd
   for (int round = 0; round < 2; ++round) {
     ASSERT_EQ(VL_WS_OK, VL_WS_getAllTvEpisodeListings(&m_Handle, 1152, &listings));
     ASSERT_EQ(static_cast<int>(series->episodes.size()), listings.Count);
-    for (int i = 0; i < listings.Count; ++i)
-      ExpectDetails(listings.Items[i], *series, Catalogue().FindEpisode(series->episodes[i]));
+    EXPECT_STREQ(series->synopsis.c_str(), listings.Items[1].Synopsys);
     ExpectTaggedAndRelease(listings);
   }
   EXPECT_TRUE(Cached("getAllTvEpisodeListings", "1152"));
@@ -500,13 +357,9 @@ TEST_F(Catalog, TivoAndSkuTranslationsAreKeptAndLeaveTheirCodeToTheCaller) {
   VL_WS_TranslateSkuIDResponse sku;
   for (int round = 0; round < 2; ++round) {
     ASSERT_EQ(VL_WS_OK, VL_WS_translateTivoExternalID(&m_Handle, tivoId.c_str(), &tivo));
-    EXPECT_EQ(0, tivo.ResponseCode);
-    EXPECT_STREQ(tivoId.c_str(), tivo.TivoExternalId);
     EXPECT_EQ(1001, tivo.TitleId);
     ExpectTaggedAndRelease(tivo);
     ASSERT_EQ(VL_WS_OK, VL_WS_translateSkuID(&m_Handle, 10021, &sku));
-    EXPECT_EQ(0, sku.ResponseCode);
-    EXPECT_STREQ("OK", sku.ResponseMessage);
     EXPECT_EQ(1002, sku.TitleId);
     ExpectTaggedAndRelease(sku);
   }
@@ -529,17 +382,12 @@ TEST_F(Catalog, TivoAndSkuTranslationsAreKeptAndLeaveTheirCodeToTheCaller) {
   EXPECT_EQ((std::vector<std::string>{"translateTivoExternalId", "translateSkuId"}), Sent(2));
 }
 
-TEST_F(Catalog, SearchMatchesNamesAndDetailSearchAlsoPeople) {
-  std::vector<const VLSimTitle*> byName = Catalogue().Search("harbor", false);
-  std::vector<const VLSimTitle*> byPeople = Catalogue().Search("Olive Stroud", true);
-  ASSERT_FALSE(byName.empty());
-  ASSERT_FALSE(byPeople.empty());
+TEST_F(Catalog, SearchesAreKeptPerQueryAndTitleType) {
   VL_WS_TitlesResponse page;
   ASSERT_EQ(VL_WS_OK, VL_WS_searchForTitle(&m_Handle, 1, 50, 2, 0, "harbor", &page));
-  ExpectPage(page, byName, 0, 1, 50);
+  const int all = page.Titles.Count;
   VL_WS_release(&page);
   ASSERT_EQ(VL_WS_OK, VL_WS_searchForTitleDetail(&m_Handle, 1, 50, 2, 0, "Olive Stroud", &page));
-  ExpectPage(page, byPeople, 0, 1, 50);
   VL_WS_release(&page);
   EXPECT_TRUE(Cached("searchForTitle", "1,50,2,0,harbor"));
   EXPECT_TRUE(Cached("searchForTitleDetail", "1,50,2,0,Olive Stroud"));
@@ -547,7 +395,7 @@ TEST_F(Catalog, SearchMatchesNamesAndDetailSearchAlsoPeople) {
   // The title type is part of the request and of the Key: television only.
   ASSERT_EQ(VL_WS_OK, VL_WS_searchForTitle(&m_Handle, 1, 50, 2, 1, "harbor", &page));
   EXPECT_GT(page.Titles.Count, 0);
-  EXPECT_LT(page.Titles.Count, static_cast<int>(byName.size()));
+  EXPECT_LT(page.Titles.Count, all);
   for (int i = 0; i < page.Titles.Count; ++i) EXPECT_TRUE(page.Titles.Items[i].IsTvListing);
   VL_WS_release(&page);
   EXPECT_TRUE(Cached("searchForTitle", "1,50,2,1,harbor"));
@@ -588,13 +436,10 @@ TEST_F(Catalog, LongQueriesThatDifferLateHaveKeysOfTheirOwn) {
 }
 
 TEST_F(Catalog, RecommendedTitlesAreKeptAndFoldTheirCode) {
-  std::vector<const VLSimTitle*> recommended = Catalogue().Recommendations(1001);
-  ASSERT_FALSE(recommended.empty());
   VL_WS_RecommendedTitlesResponse titles;
   for (int round = 0; round < 2; ++round) {
     ASSERT_EQ(VL_WS_OK, VL_WS_getRecommendedTitles(&m_Handle, 1001, &titles));
-    EXPECT_EQ(0, titles.ResponseCode);
-    ExpectTitles(titles.Titles, recommended);
+    EXPECT_EQ(static_cast<int>(Catalogue().Recommendations(1001).size()), titles.Titles.Count);
     ExpectTaggedAndRelease(titles);
   }
   EXPECT_TRUE(Cached("getRecommendedTitles", "1001"));
@@ -614,10 +459,6 @@ TEST_F(Catalog, ShouldUpdateCacheAsksTheStoreAndLeavesTheCacheAlone) {
   EXPECT_EQ(VL_WS_OK, VL_WS_shouldUpdateCache(&m_Handle, "2001-01-01T00:00:00", &update));
   EXPECT_TRUE(update);
   EXPECT_TRUE(Cached("getTitles", "1,1,5,2"));
-  VLAnswer<VL_WS_String> time;  // the load time it compares is the store's text
-  ASSERT_EQ(VL_WS_OK, VL_WS_getLastCacheLoadTimeUTC(&m_Handle, time.Fresh()));
-  EXPECT_EQ(VL_WS_TAG_STRING, *time->tag);
-  EXPECT_EQ(m_Sim.Store().LastCacheLoadTime(), std::string(time->Text, time->Length));
 
   VL_WS_Handle empty = {};
   const struct {
@@ -630,7 +471,7 @@ TEST_F(Catalog, ShouldUpdateCacheAsksTheStoreAndLeavesTheCacheAlone) {
     EXPECT_FALSE(update);
   }
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_shouldUpdateCache(&m_Handle, "2001-01-01T00:00:00", nullptr));
-  EXPECT_EQ((std::vector<std::string>{"shouldUpdateCache", "shouldUpdateCache", "getLastCacheLoadTimeUTC"}), Sent(3));
+  EXPECT_EQ(std::vector<std::string>(2, "shouldUpdateCache"), Sent(2));
 }
 
 // Only the kinds given and cached are refreshed: box art is marked for revalidation, catalogue
@@ -697,7 +538,7 @@ TEST_F(Catalog, FileCacheServesEveryHandleOfItsFile) {
   ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));
   VL_WS_TitlesResponse page;
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitles(&copy, 1, 1, 5, 2, &page));
-  ExpectPage(page, Catalogue().TitlesInGenre(1), 1, 1, 5);
+  EXPECT_EQ(5, page.Titles.Count);
   VL_WS_release(&page);
   EXPECT_EQ(VL_WS_OK, FetchTitles(6, &copy));
   EXPECT_EQ(kOne, Sent(1));
@@ -705,7 +546,7 @@ TEST_F(Catalog, FileCacheServesEveryHandleOfItsFile) {
   // Wiping the folder takes the answers with it; the handles keep working through the store.
   EXPECT_EQ(VL_WS_OK, VL_WS_clearLocalCache(dir.path().c_str()));
   ASSERT_EQ(VL_WS_OK, VL_WS_getTitles(&copy, 1, 1, 5, 2, &page));
-  ExpectPage(page, Catalogue().TitlesInGenre(1), 1, 1, 5);
+  EXPECT_EQ(5, page.Titles.Count);
   VL_WS_release(&page);
   EXPECT_EQ(kOne, Sent(1));
   VL_WS_release(&copy);
