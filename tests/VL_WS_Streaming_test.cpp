@@ -97,6 +97,8 @@ TEST_F(Streaming, RefusalFoldsIntoTheStatusOfLocationsNotOfTHX) {
   const int thxPass = Pass(10012);  // title 1001 has them
   ASSERT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirector(&m_Handle, thxPass, kStandard, kDolbyPlus51, thx.Fresh()));
   EXPECT_EQ(0, thx->ResponseCode);
+  EXPECT_STRNE("", thx->LongFormat);  // vlws_test's transcript has the settings of a bonus asset only
+  EXPECT_STRNE("", thx->ShortFormat);
   Fault("getTHXMediaDirector=code:3,times=1");
   EXPECT_EQ(VL_WS_OK, VL_WS_getTHXMediaDirector(&m_Handle, thxPass, kStandard, kDolbyPlus51, thx.Fresh()));
   EXPECT_EQ(3, thx->ResponseCode);
