@@ -7,45 +7,19 @@
 
 #include <string>
 
-#include "VLTestDir.h"
-#include "VLTestSimulator.h"
-#include "VL_WS.h"
+#include "VLBenchClient.h"
 
 namespace {
 
 enum CacheType { NO_CACHE = 0, MEMORY_CACHE = 1, FILE_CACHE = 2 };
-
-// A client handle with the cache type given (all kinds of data cached), on the simulator.
-class BenchClient {
- public:
-  explicit BenchClient(int cacheType) {
-    VL_WS_SetupParams params = VLTestSetupParams();
-    params.CacheType = cacheType;
-    params.CacheData = cacheType == NO_CACHE ? VL_WS_CacheParam::CACHE_NONE
-                                             : static_cast<VL_WS_CacheParam::CacheData>(7);
-    params.CachePath = m_Dir.path().c_str();
-    m_Status = VL_WS_initialize(&m_Handle, &params);
-  }
-  ~BenchClient() { VL_WS_release(&m_Handle); }
-  BenchClient(const BenchClient&) = delete;
-  BenchClient& operator=(const BenchClient&) = delete;
-
-  VL_WS_Status status() const { return m_Status; }
-  VL_WS_Handle* handle() { return &m_Handle; }
-
- private:
-  VLTestDir m_Dir;
-  VL_WS_Handle m_Handle = {};
-  VL_WS_Status m_Status;
-};
 
 // Runs call once untimed (which fills a cache), then times it; fails the benchmark when a call
 // fails, or when a cached client sends any request while timed.
 template <class Call>
 void RunRepeated(benchmark::State& state, int cacheType, Call call) {
   VLSimServer& sim = VLTestSimulator();
-  BenchClient client(cacheType);
-  if (client.status() != VL_WS_OK || call(client.handle()) != VL_WS_OK) {
+  VLBenchClient client(cacheType);
+  if (!client.ok() || call(client.handle()) != VL_WS_OK) {
     state.SkipWithError("the first call failed");
     return;
   }
@@ -61,14 +35,8 @@ void RunRepeated(benchmark::State& state, int cacheType, Call call) {
   if (cacheType != NO_CACHE && !sim.Requests().empty()) state.SkipWithError("a cached call reached the store");
 }
 
-// Page 1 of 20 titles of genre 1, all purchase types.
 void BM_TitlesPage(benchmark::State& state) {
-  RunRepeated(state, static_cast<int>(state.range(0)), [](VL_WS_Handle* handle) {
-    VL_WS_TitlesResponse page;
-    VL_WS_Status status = VL_WS_getTitles(handle, 1, 1, 20, 2, &page);
-    VL_WS_release(&page);
-    return status;
-  });
+  RunRepeated(state, static_cast<int>(state.range(0)), [](VL_WS_Handle* handle) { return VLBenchTitlesPage(handle); });
 }
 BENCHMARK(BM_TitlesPage)->ArgName("cache")->Arg(NO_CACHE)->Arg(MEMORY_CACHE)->Arg(FILE_CACHE)->UseRealTime();
 

@@ -21,10 +21,7 @@
 #include <algorithm>
 #include <string>
 
-#include "VLSimServer.h"
-#include "VLTestDir.h"
-#include "VLTestSimulator.h"
-#include "VL_WS.h"
+#include "VLBenchClient.h"
 
 namespace {
 
@@ -45,13 +42,6 @@ double Status(const char* field) {
   return kib * 1024;
 }
 
-bool Page(VL_WS_Handle* handle, int page, int itemsPerPage) {
-  VL_WS_TitlesResponse titles;
-  VL_WS_Status status = VL_WS_getTitles(handle, 1, page, itemsPerPage, 2, &titles);
-  VL_WS_release(&titles);
-  return status == VL_WS_OK;
-}
-
 void BM_CachedAndNetworkCalls(benchmark::State& state) {
   const int kNetworkCalls = 100, kCachedPerNetworkCall = 5;  // per half
   for (auto _ : state) {
@@ -59,22 +49,20 @@ void BM_CachedAndNetworkCalls(benchmark::State& state) {
     double base = HeapInUse(), rssBase = Status("VmRSS"), peak = 0;
     double heap[2] = {0, 0}, rss[2] = {0, 0};
     for (int half = 0; half < 2; ++half) {
-      VLTestDir dir;
-      VL_WS_SetupParams params = VLTestSetupParams();
-      params.CacheType = 2;
-      params.CacheData = VL_WS_CacheParam::CACHE_METADATA;
-      params.CachePath = dir.path().c_str();
-      VL_WS_Handle handle = {};
-      bool ok = VL_WS_initialize(&handle, &params) == VL_WS_OK;
-      for (int call = 0; ok && call < kNetworkCalls; ++call) {
-        int page = call % 5 + 1, items = 16 + call / 5;
-        for (int again = 0; ok && again <= kCachedPerNetworkCall; ++again) ok = Page(&handle, page, items);
-        peak = std::max(peak, HeapInUse() - base);
+      bool ok;
+      {
+        VLBenchClient client(2, VL_WS_CacheParam::CACHE_METADATA);
+        ok = client.ok();
+        for (int call = 0; ok && call < kNetworkCalls; ++call) {
+          int page = call % 5 + 1, items = 16 + call / 5;
+          for (int again = 0; ok && again <= kCachedPerNetworkCall; ++again)
+            ok = VLBenchTitlesPage(client.handle(), page, items) == VL_WS_OK;
+          peak = std::max(peak, HeapInUse() - base);
+        }
+        heap[half] = HeapInUse() - base;
+        malloc_trim(0);
+        rss[half] = Status("VmRSS") - rssBase;
       }
-      heap[half] = HeapInUse() - base;
-      malloc_trim(0);
-      rss[half] = Status("VmRSS") - rssBase;
-      VL_WS_release(&handle);
       if (!ok) return state.SkipWithError("a call failed");
     }
     state.counters["heap_peak"] = peak;

@@ -17,19 +17,13 @@
 #include <time.h>
 #include <unistd.h>
 
-#include <openssl/evp.h>
-#include <openssl/rand.h>
-
 #include <string>
 #include <vector>
 
 #include "BoxArtDownloader.h"
-#include "VLTestDir.h"
-#include "VLTestSimulator.h"
+#include "VLBenchClient.h"
+#include "VLSimTestClient.h"
 #include "VLUtilities.h"
-#include "VLWSAELog.h"
-#include "VL_Log.h"
-#include "VL_WS.h"
 #include "VL_WS_Client.h"
 
 extern char** environ;
@@ -111,24 +105,7 @@ std::vector<std::string> Curl() {
   return argv;
 }
 
-// A client handle without a cache on the simulator.
-class Client {
- public:
-  Client() {
-    VLTestSimulator();
-    VL_WS_SetupParams params = VLTestSetupParams();
-    m_Status = VL_WS_initialize(&m_Handle, &params);
-  }
-  ~Client() { VL_WS_release(&m_Handle); }
-  bool ok() const { return m_Status == VL_WS_OK; }
-  VL_WS_Handle* handle() { return &m_Handle; }
-
- private:
-  VL_WS_Handle m_Handle = {};
-  VL_WS_Status m_Status;
-};
-
-// Page 1 of 20 titles of genre 1, any purchase type: the page of every figure.
+// The page of every figure, which must hold its 20 titles.
 bool TitlesPage(VL_WS_Handle* handle) {
   VL_WS_TitlesResponse page;
   VL_WS_Status status = VL_WS_getTitles(handle, 1, 1, 20, 2, &page);
@@ -138,7 +115,8 @@ bool TitlesPage(VL_WS_Handle* handle) {
 }
 
 void BM_ClientTitles(benchmark::State& state) {
-  Client client;
+  VLTestSimulator();
+  VLBenchClient client;
   if (!client.ok() || !TitlesPage(client.handle())) return state.SkipWithError("the first call failed");
   PerCall calls(state);
   for (auto _ : state) {
@@ -173,60 +151,16 @@ void BM_NodeSoapTitles(benchmark::State& state) {
 }
 BENCHMARK(BM_NodeSoapTitles)->Iterations(1)->UseRealTime();
 
-// The bytes the client sends for the page (HTTP header and envelope), from its raw log.
-std::string ClientRequest(VL_WS_Handle* handle) {
-  VLTestDir dir;
-  std::string sent;
-  VLWSAELog::InitWSLogs(0x1000, 2, dir.path().c_str());  // "soap_sent" into a log file
-  VL_LogSetObserver([](void* to, const char*, int, const char* text,
-                       size_t n) { static_cast<std::string*>(to)->append(text, n); },
-                    &sent);
-  bool ok = TitlesPage(handle);
-  VL_LogSetObserver(nullptr, nullptr);
-  VLWSAELog::InitWSLogs(0, 2, dir.path().c_str());
-  return ok ? sent : std::string();
-}
-
-std::string Base64(const unsigned char* bytes, size_t n) {
-  std::string text(4 * ((n + 2) / 3) + 1, '\0');
-  text.resize(static_cast<size_t>(EVP_EncodeBlock(reinterpret_cast<unsigned char*>(&text[0]), bytes, static_cast<int>(n))));
-  return text;
-}
-
-// Replaces the text of element tag (its first occurrence) with value.
-void SetElement(std::string& xml, const std::string& tag, const std::string& value) {
-  size_t open = xml.find("<" + tag);
-  size_t start = xml.find('>', open) + 1;
-  size_t end = xml.find("</" + tag + ">", start);
-  if (open != std::string::npos && end != std::string::npos) xml.replace(start, end - start, value);
-}
-
-// The envelope with a new UsernameToken, since the store takes every nonce once: a new nonce and
-// time and the password digest of both, of the same lengths as before.
-std::string WithNewToken(std::string envelope) {
-  unsigned char nonce[20];
-  RAND_bytes(nonce, sizeof nonce);
-  char created[32];
-  time_t now = time(nullptr);
-  strftime(created, sizeof created, "%Y-%m-%dT%H:%M:%SZ", gmtime(&now));
-  std::string hashed(reinterpret_cast<const char*>(nonce), sizeof nonce);
-  hashed += created;
-  hashed += VLTestSimulator().Options().password;
-  unsigned char digest[EVP_MAX_MD_SIZE];
-  unsigned int length = 0;
-  EVP_Digest(hashed.data(), hashed.size(), digest, &length, EVP_sha1(), nullptr);
-  SetElement(envelope, "wsse:Nonce", Base64(nonce, sizeof nonce));
-  SetElement(envelope, "wsu:Created", created);
-  SetElement(envelope, "wsse:Password", Base64(digest, length));
-  return envelope;
-}
-
 void BM_CurlPostsTheClientsRequest(benchmark::State& state) {
-  Client client;
-  std::string request = client.ok() ? ClientRequest(client.handle()) : std::string();
+  VLTestSimulator();
+  VLBenchClient client;
+  // The bytes the client sends for the page; the store takes every nonce once, so each post has a
+  // new UsernameToken.
+  bool ok = false;
+  std::string request = VLRawLogOf([&] { ok = client.ok() && TitlesPage(client.handle()); }).sent;
   size_t body = request.find("\r\n\r\n");
   size_t action = request.find("SOAPAction: ");
-  if (body == std::string::npos || action == std::string::npos) return state.SkipWithError("no request captured");
+  if (!ok || body == std::string::npos || action == std::string::npos) return state.SkipWithError("no request captured");
   std::string soapAction = request.substr(action, request.find("\r\n", action) - action);
   VLTestDir dir;
   const std::string file = dir / "request.xml";
@@ -236,7 +170,8 @@ void BM_CurlPostsTheClientsRequest(benchmark::State& state) {
   PerCall calls(state);
   for (auto _ : state) {
     state.PauseTiming();
-    bool written = VLWriteFile(file, WithNewToken(request.substr(body + 4)));
+    bool written =
+        VLWriteFile(file, VLWithNewToken(request.substr(body + 4), VLTestSimulator().Options().password, time(nullptr)));
     state.ResumeTiming();
     Child curl = Run(argv);
     if (!written || !curl.ok || curl.out != "200") return state.SkipWithError(("curl failed: " + curl.out).c_str());
@@ -249,7 +184,8 @@ BENCHMARK(BM_CurlPostsTheClientsRequest)->UseRealTime();
 const std::string& BoxArtPrefix() { return VLTestSimulator().Catalogue().Titles().front().boxArt; }
 
 void BM_ClientBoxArtToFile(benchmark::State& state) {
-  Client client;
+  VLTestSimulator();
+  VLBenchClient client;
   VLTestDir dir;
   const VLString file((dir / "art.jpg").c_str());
   PerCall calls(state);

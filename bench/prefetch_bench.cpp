@@ -7,51 +7,26 @@
 
 #include <memory>
 
-#include "VLTestDir.h"
-#include "VLTestSimulator.h"
-#include "VL_WS.h"
+#include "VLBenchClient.h"
 
 namespace {
 
 // Genre 1 holds every film: eight pages of 20 titles.
-const int kGenre = 1;
-const int kItemsPerPage = 20;
 const int kPages = 8;
 
 enum Kind { NOT_PREFETCHED, PREFETCHED, SHOWN_AGAIN };
 
-VL_WS_Status TitlesPage(VL_WS_Handle* handle, int page) {
-  VL_WS_TitlesResponse response;
-  VL_WS_Status status = VL_WS_getTitles(handle, kGenre, page, kItemsPerPage, 2, &response);
-  VL_WS_release(&response);
-  return status;
-}
-
-// The main handle and its prefetching duplicate on a new cache file.
-class Handles {
- public:
-  Handles() {
-    VLTestSimulator();
-    VL_WS_SetupParams params = VLTestSetupParams();
-    params.CacheType = 2;
-    params.CacheData = VL_WS_CacheParam::CACHE_METADATA;
-    params.CachePath = m_Dir.path().c_str();
-    m_Ok = VL_WS_initialize(&main, &params) == VL_WS_OK && VL_WS_duplicate(&prefetch, &main) == VL_WS_OK;
-  }
-  ~Handles() {
-    VL_WS_release(&prefetch);
-    VL_WS_release(&main);
-  }
-  bool ok() const { return m_Ok; }
-
-  VL_WS_Handle main = {}, prefetch = {};
-
- private:
-  VLTestDir m_Dir;
-  bool m_Ok;
+// The main handle on a new cache file and its prefetching duplicate.
+struct Handles {
+  Handles() { ok = main.ok() && VL_WS_duplicate(&prefetch, main.handle()) == VL_WS_OK; }
+  ~Handles() { VL_WS_release(&prefetch); }
+  VLBenchClient main{2, VL_WS_CacheParam::CACHE_METADATA};
+  VL_WS_Handle prefetch = {};
+  bool ok;
 };
 
 void BM_NextPage(benchmark::State& state, Kind kind) {
+  VLTestSimulator();
   std::unique_ptr<Handles> handles;
   int page = 0;
   for (auto _ : state) {
@@ -62,10 +37,11 @@ void BM_NextPage(benchmark::State& state, Kind kind) {
       page = 0;
     }
     ++page;
-    bool ready = handles->ok() && (kind == NOT_PREFETCHED ||
-                                   TitlesPage(kind == PREFETCHED ? &handles->prefetch : &handles->main, page) == VL_WS_OK);
+    bool ready = handles->ok && (kind == NOT_PREFETCHED ||
+                                 VLBenchTitlesPage(kind == PREFETCHED ? &handles->prefetch : handles->main.handle(),
+                                                   page) == VL_WS_OK);
     state.ResumeTiming();
-    if (!ready || TitlesPage(&handles->main, page) != VL_WS_OK) return state.SkipWithError("a call failed");
+    if (!ready || VLBenchTitlesPage(handles->main.handle(), page) != VL_WS_OK) return state.SkipWithError("a call failed");
   }
 }
 // A fixed count: the untimed work (a page from the store, kept in the cache file) takes far

@@ -330,15 +330,6 @@ TEST_F(CfgMigration, TheOldSettingsMoveToTheOldReleasesFolder) {
   EXPECT_FALSE(LogMentions("USSettingsFile("));
 }
 
-TEST_F(CfgMigration, AnExistingFileOfTheOldReleaseIsNeverOverwritten) {
-  Put(m_US, "AuthToken", "token-already-there", true);
-  EXPECT_EQ("true", SetFile(m_BC));
-  EXPECT_EQ("token-already-there", Setting(m_US, "AuthToken", true));
-  EXPECT_FALSE(VLFile::Exist(m_BC.c_str()));
-  EXPECT_TRUE(Logged("4:VLCfgLibAE::setFile USSettingsFile(" + m_US + ") existed."));
-  EXPECT_FALSE(LogMentions("copy BCSettingsFile"));
-}
-
 TEST_F(CfgMigration, TheOldFileStaysWhenItCouldNotBeCopied) {
   // A file stands where the old release's folder would be created.
   ASSERT_EQ(VL_WS_OK, VL_WS_createFolder(Path("app").c_str()));
@@ -350,12 +341,18 @@ TEST_F(CfgMigration, TheOldFileStaysWhenItCouldNotBeCopied) {
   EXPECT_TRUE(LogMentions("clear BCCachePath"));
 }
 
-TEST_F(CfgMigration, AnOldFileThatIsTheOldReleasesFileItselfIsLeftAlone) {
-  Put(m_US, "AuthToken", "token-in-place", true);
+// An old file that is the old release's file itself is left alone, and an existing file of the
+// old release is never overwritten.
+TEST_F(CfgMigration, AnExistingFileOfTheOldReleaseIsKept) {
+  Put(m_US, "AuthToken", "token-already-there", true);
   EXPECT_EQ("true", SetFile(m_US));
-  EXPECT_EQ("token-in-place", Setting(m_US, "AuthToken", true));
   EXPECT_TRUE(VLFile::Exist((m_Cache + "t1_175.jpg").c_str()));
   EXPECT_FALSE(LogMentions("USSettingsFile("));
+  EXPECT_EQ("true", SetFile(m_BC));
+  EXPECT_EQ("token-already-there", Setting(m_US, "AuthToken", true));
+  EXPECT_FALSE(VLFile::Exist(m_BC.c_str()));
+  EXPECT_TRUE(Logged("4:VLCfgLibAE::setFile USSettingsFile(" + m_US + ") existed."));
+  EXPECT_FALSE(LogMentions("copy BCSettingsFile"));
 }
 
 }  // namespace

@@ -37,13 +37,7 @@ struct Row {
 class BoxArt : public VLSimClientTest {
  protected:
   // A setup with a cache of cacheType that stores every kind of data (file caches in m_Dir).
-  VL_WS_SetupParams Setup(int cacheType) {
-    VL_WS_SetupParams params = VLTestSetupParams();
-    params.CacheType = cacheType;
-    params.CacheData = static_cast<VL_WS_CacheParam::CacheData>(cacheType ? 7 : 0);
-    params.CachePath = m_Dir.path().c_str();
-    return params;
-  }
+  VL_WS_SetupParams Setup(int cacheType) { return VLTestSetupParams(cacheType, 7, m_Dir.path().c_str()); }
   // Makes m_Handle anew; the request log then starts empty.
   void Init(const VL_WS_SetupParams& params) {
     VL_WS_release(&m_Handle);
@@ -92,32 +86,34 @@ class BoxArt : public VLSimClientTest {
   VLTestDir m_Dir;
 };
 
+// The size word of the path ("135s") and the prefix, percent-encoded in the path, as they are in
+// the file name ("135").
 TEST_F(BoxArt, FileCacheDownloadsOnceAndThenAnswersFromTheFile) {
   Init(2);
-  std::string file = m_Dir / "t1001_175.jpg";
-  EXPECT_EQ(file, Location(VL_WS_BOXART_175, "t1001_"));
-  EXPECT_EQ(Served("t1001_", VL_WS_BOXART_175), VLReadFile(file));
+  std::string file = m_Dir / "night owl_135.jpg";
+  EXPECT_EQ(file, Location(VL_WS_BOXART_135S, "night owl_"));
+  EXPECT_EQ(Served("night owl_", VL_WS_BOXART_135S), VLReadFile(file));
   std::vector<VLSimRequest> images = Images(1);
   ASSERT_EQ(1u, images.size());
-  EXPECT_EQ("/images/boxart/175/t1001_175.jpg", images[0].path);
+  EXPECT_EQ("/images/boxart/135s/night%20owl_135.jpg", images[0].path);
   EXPECT_EQ("DUDUVud", images[0].userAgent);
   EXPECT_EQ("", images[0].ifModifiedSince);
 
-  Row row = ReadRow("t1001_", VL_WS_BOXART_175);
+  Row row = ReadRow("night owl_", VL_WS_BOXART_135S);
   ASSERT_TRUE(row.found);
   EXPECT_EQ(VLReadFile(file).size(), row.length);
   EXPECT_NE("", row.lastModified);
   EXPECT_EQ(0u, row.needUpdate);
   EXPECT_EQ("", row.data);  // the image is the file
 
-  EXPECT_EQ(file, Location(VL_WS_BOXART_175, "t1001_"));
+  EXPECT_EQ(file, Location(VL_WS_BOXART_135S, "night owl_"));
   EXPECT_EQ(1u, Images(1).size());
 
   // An image file that disappeared is fetched again.
   ASSERT_EQ(0, remove(file.c_str()));
-  EXPECT_EQ(file, Location(VL_WS_BOXART_175, "t1001_"));
+  EXPECT_EQ(file, Location(VL_WS_BOXART_135S, "night owl_"));
   EXPECT_EQ(2u, Images(2).size());
-  EXPECT_EQ(Served("t1001_", VL_WS_BOXART_175), VLReadFile(file));
+  EXPECT_EQ(Served("night owl_", VL_WS_BOXART_135S), VLReadFile(file));
 }
 
 TEST_F(BoxArt, MarkedImagesAreRevalidatedOnceWithAConditionalGet) {
@@ -154,15 +150,6 @@ TEST_F(BoxArt, MarkedImagesAreRevalidatedOnceWithAConditionalGet) {
   ASSERT_TRUE(row.found);
   EXPECT_NE(before.lastModified, row.lastModified);
   EXPECT_EQ(0u, row.needUpdate);
-}
-
-TEST_F(BoxArt, SizeWordsAndPrefixesReachPathAndFileName) {
-  Init(2);
-  std::string file = m_Dir / "night owl_135.jpg";
-  EXPECT_EQ(file, Location(VL_WS_BOXART_135S, "night owl_"));
-  ASSERT_EQ(1u, Images(1).size());
-  EXPECT_EQ("/images/boxart/135s/night%20owl_135.jpg", Images(1)[0].path);
-  EXPECT_EQ(Served("night owl_", VL_WS_BOXART_135S), VLReadFile(file));
 }
 
 TEST_F(BoxArt, WithoutAnImageTheAnswerIsItsUrlAndNothingIsLeftBehind) {

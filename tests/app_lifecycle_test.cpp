@@ -81,31 +81,27 @@ TEST_F(Lifecycle, WithoutAStageNothingStartsAndNoKeyIsSent) {
   EXPECT_TRUE(stage.ClassIds().empty());
 }
 
-TEST_F(Lifecycle, OnTerminateSendsTheTerminateKeyWithoutPauseWhenSpFlagIsZero) {
-  std::chrono::steady_clock::duration first;
-  std::string out = RunLifecycle(&launcher, 2, &first);
-  EXPECT_LT(first, std::chrono::milliseconds(800));
-  EXPECT_EQ(std::string::npos, out.find("In Sleep FUNCTION"));
-  ASSERT_EQ(4u, stage.Keys().size());  // onTerminate may be called again: it sends the keys again
-  for (size_t i = 0; i < 4; ++i) {
-    EXPECT_EQ(kTerminateKey, stage.Keys()[i].keyCode);
-    EXPECT_EQ(i % 2 == 0, stage.Keys()[i].pressed);
-    EXPECT_EQ(0u, stage.Keys()[i].modifiers);
-  }
-}
-
-TEST_F(Lifecycle, OnTerminateWithSpFlagSendsItsKeyAndPausesFirst) {
-  sp_flag = 1;
-  std::chrono::steady_clock::duration first;
-  std::string out = RunLifecycle(&launcher, 1, &first);
-  EXPECT_GE(first, std::chrono::milliseconds(800));
-  EXPECT_NE(std::string::npos,
-            out.find("\n[VL_FLASH] Now send  AEKEY_TERMINATEANIMATION \nIn Sleep FUNCTION, delay time is :800 ms\n"));
-  ASSERT_EQ(4u, stage.Keys().size());
-  const unsigned int codes[] = {kSpFlagKey, kSpFlagKey, kTerminateKey, kTerminateKey};
-  for (size_t i = 0; i < 4; ++i) {
-    EXPECT_EQ(codes[i], stage.Keys()[i].keyCode) << i;
-    EXPECT_EQ(i % 2 == 0, stage.Keys()[i].pressed) << i;
+// onTerminate sends the terminate key, pressed and released, at once, each time it is called;
+// with sp_flag set it sends its own key first and pauses.
+TEST_F(Lifecycle, OnTerminateSendsItsKeysAndPausesOnlyWithSpFlag) {
+  const std::string pause = "\n[VL_FLASH] Now send  AEKEY_TERMINATEANIMATION \nIn Sleep FUNCTION, delay time is :800 ms\n";
+  for (int flag : {0, 1}) {
+    SCOPED_TRACE(flag);
+    vlplatform::Stage own(1);
+    vlplatform::Launcher with(&own);
+    sp_flag = flag;
+    std::chrono::steady_clock::duration first;
+    std::string out = RunLifecycle(&with, 2 - flag, &first);
+    EXPECT_EQ(flag == 1, first >= std::chrono::milliseconds(800));
+    EXPECT_EQ(flag == 1, out.find(flag ? pause : "In Sleep FUNCTION") != std::string::npos);
+    const unsigned int codes[] = {flag ? kSpFlagKey : kTerminateKey, flag ? kSpFlagKey : kTerminateKey,
+                                  kTerminateKey, kTerminateKey};
+    ASSERT_EQ(4u, own.Keys().size());
+    for (size_t i = 0; i < 4; ++i) {
+      EXPECT_EQ(codes[i], own.Keys()[i].keyCode) << i;
+      EXPECT_EQ(i % 2 == 0, own.Keys()[i].pressed) << i;
+      EXPECT_EQ(0u, own.Keys()[i].modifiers) << i;
+    }
   }
 }
 

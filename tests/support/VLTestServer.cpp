@@ -189,26 +189,14 @@ std::string VLTestServer::Body(const std::string& request) {
   return end == std::string::npos ? "" : request.substr(end + 4);
 }
 
-static size_t FindHeader(const std::string& head, const std::string& name, size_t from) {
-  for (size_t p = head.find("\r\n", from); p != std::string::npos; p = head.find("\r\n", p + 2)) {
-    if (strncasecmp(head.c_str() + p + 2, (name + ":").c_str(), name.size() + 1) == 0) return p + 2;
-  }
-  return std::string::npos;
-}
-
 std::string VLTestServer::Header(const std::string& request, const std::string& name) {
-  std::string head = Head(request);
-  size_t p = FindHeader(head, name, 0);
-  if (p == std::string::npos) return "";
-  size_t start = head.find_first_not_of(' ', p + name.size() + 1);
-  return head.substr(start, head.find("\r\n", start) - start);
-}
-
-int VLTestServer::HeaderCount(const std::string& request, const std::string& name) {
-  std::string head = Head(request);
-  int n = 0;
-  for (size_t p = FindHeader(head, name, 0); p != std::string::npos; p = FindHeader(head, name, p)) n++;
-  return n;
+  std::string head = Head(request), key = "\r\n" + name + ":";
+  for (size_t p = head.find("\r\n"); p != std::string::npos; p = head.find("\r\n", p + 2)) {
+    if (strncasecmp(head.c_str() + p, key.c_str(), key.size()) != 0) continue;
+    size_t start = head.find_first_not_of(' ', p + key.size());
+    return head.substr(start, head.find("\r\n", start) - start);
+  }
+  return "";
 }
 
 std::string VLTestServer::HttpReply(const std::string& body, const std::string& status, const std::string& extraHeaders) {

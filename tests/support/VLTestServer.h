@@ -72,8 +72,6 @@ class VLTestServer {
   static std::string Body(const std::string& request);
   // The value of header name (first occurrence), "" when absent.
   static std::string Header(const std::string& request, const std::string& name);
-  // How often header name occurs.
-  static int HeaderCount(const std::string& request, const std::string& name);
 
   // An HTTP reply with the body; Content-Type text/xml, Content-Length, extra headers as given.
   static std::string HttpReply(const std::string& body, const std::string& status = "200 OK",
