@@ -137,8 +137,11 @@ TEST_F(HttpGet, AnswersThatArriveInPiecesAreReadWhole) {
 
 TEST_F(HttpGet, ConnectionFailures) {
   EXPECT_EQ(VL_WS_E_CONNECT, Run(VLClosedPort()));
+  // The server resets the connection on accepting it: the reset may reach the client while it
+  // still connects, or when it sends.
   m_Server.SetBehaviour(VLTestServer::kCloseAtOnce);
-  EXPECT_EQ(VL_WS_E_NETWORK, Run(m_Server.Port()));
+  VL_WS_Status status = Run(m_Server.Port());
+  EXPECT_TRUE(status == VL_WS_E_NETWORK || status == VL_WS_E_CONNECT) << status;
 }
 
 // The server time's request, which no other test sees whole (it makes a context of its own).
