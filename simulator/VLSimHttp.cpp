@@ -251,7 +251,8 @@ void VLSimConnection::Close(bool graceful) {
 }
 
 VLSimSent VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,
-                            const std::vector<VLSimFault>& faults, VLSimStopSignal& stop) {
+                            const std::vector<VLSimFault>& faults, VLSimStopSignal& stop,
+                            const std::function<void(int status)>& answering) {
   VLSimSent sent;
   bool cut = false;
   long lengthDelta = 0;
@@ -308,6 +309,7 @@ VLSimSent VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse respo
   message += "Connection: close\r\n\r\n";
   message += cut ? response.body.substr(0, response.body.size() / 2) : response.body;
 
+  answering(response.status);
   bool written = true;
   if (trickle >= 0) {
     for (size_t pos = 0; written && pos < message.size(); pos += kTricklePiece) {

@@ -11,6 +11,7 @@
 #include <openssl/ssl.h>
 
 #include <condition_variable>
+#include <functional>
 #include <mutex>
 #include <string>
 #include <utility>
@@ -91,15 +92,18 @@ class VLSimConnection {
 };
 
 // Sends response on connection, shaped by the transport faults among faults (delay, close, cut,
-// status, malformed, truncated, gzip, deflate, badlength, trickle). The caller closes the
-// connection afterwards (so it can log the exchange before the client sees the end of it):
-// abruptly when abrupt is set, else gracefully.
+// status, malformed, truncated, gzip, deflate, badlength, trickle). answering is called with the
+// status just before the first byte of an answer goes out (not when a fault sends none): a client
+// reads no further than Content-Length and may be on to its next request before the connection
+// ends, so what answering records must be there when the client has the answer. The caller closes
+// the connection afterwards: abruptly when abrupt is set, else gracefully.
 struct VLSimSent {
   int status = 0;  // the HTTP status sent, 0 when nothing was sent
   bool abrupt = false;
 };
 VLSimSent VLSimSendResponse(VLSimConnection& connection, VLSimHttpResponse response,
-                            const std::vector<VLSimFault>& faults, VLSimStopSignal& stop);
+                            const std::vector<VLSimFault>& faults, VLSimStopSignal& stop,
+                            const std::function<void(int status)>& answering);
 
 // Percent-decoding of a URL path or query component ("%20" and "+" in queries).
 std::string VLSimURLDecode(const std::string& text, bool plusIsSpace);

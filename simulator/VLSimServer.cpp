@@ -320,8 +320,8 @@ void VLSimServer::Impl::Serve(int fd, bool tls, int number) {
     VLSimRequest entry;
     entry.connection = number;
     entry.tls = tls;
-    // The entry goes into the log before the connection ends, so a client that has its answer
-    // finds the entry there.
+    // The entry goes into the log before the answer goes out (or, when none does, before the
+    // connection ends), so a client that has its answer finds the entry there.
     auto record = [this, &entry] {
       context.log.Add(entry);
       if (context.options.printRequests) std::cout << VLSimRequestLog::Format(entry) << std::endl;
@@ -353,10 +353,14 @@ void VLSimServer::Impl::Serve(int fd, bool tls, int number) {
                                                    : VLSimHttpResponse::Page(400, problem);
       if (!problem.empty()) entry.note = problem;
       for (const VLSimFault& fault : faults) entry.faults += (entry.faults.empty() ? "" : " ") + fault.ToString();
-      VLSimSent sent = VLSimSendResponse(connection, response, faults, context.stop);
-      entry.status = sent.status;
+      bool recorded = false;
+      VLSimSent sent = VLSimSendResponse(connection, response, faults, context.stop, [&](int status) {
+        entry.status = status;
+        record();
+        recorded = true;
+      });
       graceful = !sent.abrupt;
-      record();
+      if (!recorded) record();
     }
     connection.Close(graceful);
     // Forget the socket before the connection's destructor closes it and its number is reused.

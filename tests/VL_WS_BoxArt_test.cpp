@@ -42,7 +42,7 @@ class BoxArt : public VLSimClientTest {
   void Init(const VL_WS_SetupParams& params) {
     VL_WS_release(&m_Handle);
     ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
-    ClearRequests();
+    m_Sim.ClearRequests();
   }
   void Init(int cacheType) { Init(Setup(cacheType)); }
   // The answer of VL_WS_getBoxArtImage, which must have the status.
@@ -192,7 +192,7 @@ TEST_F(BoxArt, OnlyJpegImagesAreKept) {
       ASSERT_TRUE(m_Handle.client->m_Cache->WriteBoxArt("t1006_", VL_WS_BOXART_102, row.length, row.lastModified.c_str(),
                                                         0, VLString(row.data.data(), row.data.size() / 2)));
     }
-    ClearRequests();
+    m_Sim.ClearRequests();
     ASSERT_EQ(VL_WS_OK, Data(VL_WS_BOXART_102, "t1006_", &bytes));
     EXPECT_EQ(Served("t1006_", VL_WS_BOXART_102), bytes);
     EXPECT_EQ(1u, Images(1).size());

@@ -82,7 +82,7 @@ class Catalog : public VLTestAccountClient {
   VL_WS_Status Init(const VL_WS_SetupParams& params) {
     VL_WS_release(&m_Handle);
     VL_WS_Status status = VL_WS_initialize(&m_Handle, &params);
-    ClearRequests();
+    m_Sim.ClearRequests();
     TakeLog();
     return status;
   }

@@ -69,7 +69,7 @@ TEST_F(Client, EnvironmentsChooseTheEndpoint) {
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(std::string(c.host) + c.path + " " + std::to_string(c.digit));
-    ClearRequests();
+    m_Sim.ClearRequests();
     if (c.digit >= 0) m_Sim.Store().SetDeviceEnv(kDevice, c.digit);
     VL_WS_SetupParams params = VLTestSetupParams();
     params.ContentType = c.content;
@@ -261,7 +261,7 @@ TEST_F(Client, UserAgentTellsFirmwareRevisionAndModel) {
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(c.userAgent);
-    ClearRequests();
+    m_Sim.ClearRequests();
     VL_WS_SetupParams params = VLTestSetupParams();
     params.firmwareVersion = c.firmware;
     params.ApplicationRevision = c.revision;
@@ -306,7 +306,7 @@ TEST_F(Client, UnknownAccessTypeIsAskedOfTheStore) {
   EXPECT_EQ(static_cast<soap*>(&m_Handle.client->m_StreamAPI), Routing(m_Handle));
 
   // A given access type is kept without asking.
-  ClearRequests();
+  m_Sim.ClearRequests();
   params.AccessType = DOWNLOAD;
   m_Sim.Store().SetAccessType(STREAM);
   ASSERT_EQ(VL_WS_OK, Init(params));
@@ -444,7 +444,7 @@ TEST_F(Client, DuplicateHasItsOwnConnectionsAndCacheConnectionAndOutlivesItsSour
   m_Sim.Store().SetAccessType(DOWNLOAD);
   ASSERT_EQ(VL_WS_OK, Init(params));
   ASSERT_TRUE(m_Handle.client->m_Cache->WriteMetaData("getNavigation", "", "answer"));
-  ClearRequests();
+  m_Sim.ClearRequests();
 
   VL_WS_Handle copy = {};
   ASSERT_EQ(VL_WS_OK, VL_WS_duplicate(&copy, &m_Handle));

@@ -129,7 +129,7 @@ TEST_F(Bandwidth, TheProbeURLComesFromTheStoresConfigurationOnceAndPointsAtTheIm
   EXPECT_EQ("/speedtest/probe.bin", requests[1].path);
   EXPECT_EQ("DUDUVud", requests[1].userAgent);
 
-  ClearRequests();
+  m_Sim.ClearRequests();
   ASSERT_EQ(VL_WS_OK, VL_WS_checkBandwidth(&m_Handle, &bits));
   requests = Requests(1);
   ASSERT_EQ(1u, requests.size());

@@ -112,7 +112,7 @@ TEST_F(Wishlist, ScanReadsPagesUntilEveryTitleIsFound) {
   EXPECT_EQ(std::vector<std::string>{"VL_WS_checkTitlesInWishlist, ret:0"}, TakeLog());
 
   // All of them on page 1: page 2 is not asked for.
-  ClearRequests();
+  m_Sim.ClearRequests();
   EXPECT_EQ((std::vector<bool>{true, true, true}), Scan({1011, 1060, 1011}));
   EXPECT_EQ(1u, Requests(1).size());
 }
@@ -126,7 +126,7 @@ TEST_F(Wishlist, UnfinishedScanKeepsNoFlags) {
 
   // A refused page (a token the store does not know) ends the scan as well.
   Settings().AuthToken = "SIMTOKEN-UNKNOWN";
-  ClearRequests();
+  m_Sim.ClearRequests();
   EXPECT_EQ((std::vector<bool>{false, false}), Scan({1002, 1100}));
   EXPECT_EQ(1u, Requests(1).size());
   EXPECT_EQ(-1, Flag(1002));

@@ -51,7 +51,7 @@ class Simulator : public VLSimClientTest {
   // Sends request to the simulator's TLS port: the answer's status line, and what the
   // simulator's check of the UsernameToken found. The whole answer is left in m_Answer.
   std::pair<std::string, std::string> Send(const std::string& request) {
-    ClearRequests();
+    m_Sim.ClearRequests();
     m_Answer = VLSimExchange(m_Sim.TlsPort(), m_Sim.CAFile(), "store.ostrel.example", request);
     return {m_Answer.substr(0, m_Answer.find("\r\n")), Requests(1).at(0).authentication};
   }
@@ -77,7 +77,7 @@ TEST_F(Simulator, RefusesRequestsTheStoreWouldRefuse) {
   for (const auto& other : others) {
     params = VLTestSetupParams();
     other.change(params);
-    ClearRequests();
+    m_Sim.ClearRequests();
     EXPECT_EQ(other.status, Label(params));
     EXPECT_EQ(other.authentication, Requests(1).at(0).authentication);
   }

@@ -164,7 +164,7 @@ class Soak : public VLSimClientTest {
     for (int t = 0; t < kThreads; ++t) threads.emplace_back(&Soak::Run, this, &handles[t], &randoms[t]);
     for (std::thread& thread : threads) thread.join();
     m_Sim.ClearFaults();
-    ClearRequests();
+    m_Sim.ClearRequests();
 #if defined(__SANITIZE_ADDRESS__)
     return __sanitizer_get_current_allocated_bytes();
 #else

@@ -30,7 +30,7 @@ void VLTestAccountClient::Init(VL_WS_AccessType accessType, int cacheData) {
   params.AuthToken = token.c_str();
   params.AccessType = accessType;
   ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
-  ClearRequests();
+  m_Sim.ClearRequests();
   m_Log.clear();
 }
 

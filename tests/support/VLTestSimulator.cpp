@@ -1,6 +1,5 @@
 #include "VLTestSimulator.h"
 
-#include <stdint.h>
 #include <stdio.h>
 #include <stdlib.h>
 
@@ -57,11 +56,6 @@ std::vector<VLSimRequest> VLSimClientTest::Requests(size_t count) {
   std::stable_sort(log.begin(), log.end(),
                    [](const VLSimRequest& a, const VLSimRequest& b) { return a.connection < b.connection; });
   return log;
-}
-
-void VLSimClientTest::ClearRequests() {
-  m_Sim.WaitForRequests(SIZE_MAX, 200);
-  m_Sim.ClearRequests();
 }
 
 void VLSimClientTest::Fault(const std::string& spec) {

@@ -44,12 +44,9 @@ class VLSimClientTest : public testing::Test {
   void TearDown() override;
 
   // The request log once it holds count requests (waiting up to 5 s), in the order the client
-  // connected: the simulator logs a request after its answer went out (or its handshake failed),
-  // so the client may be done with an answer, and on to the next request, before.
+  // connected: the simulator logs a request as it answers it, but a failed TLS handshake only
+  // once the client has given up and may be on to its next request.
   std::vector<VLSimRequest> Requests(size_t count);
-  // Empties the request log once the requests answered so far are in it: for the same reason, it
-  // gives them 200 ms to arrive first.
-  void ClearRequests();
   void Fault(const std::string& spec);
 
   VLSimServer& m_Sim = VLTestSimulator();
