@@ -253,7 +253,8 @@ TEST_F(Vlws, EveryOperationAnswers) {
       {"settings-page --token {AuthToken} {store}"},
       {"country --token {AuthToken} {store}"},
       {"adult-verification --token {AuthToken} {store}"},
-      {"adult-pin --pin 7 --token {AuthToken} {store}"},
+      {"adult-pin --pin 7 --token {AuthToken} {store}"},  // the account's "0007"
+      {"adult-pin --pin 70007 --token {AuthToken} {store}"},
       {"return-error --access-type 1 --token {AuthToken} {store}"},
       {"return-timeout --access-type 1 --token {AuthToken} {store}"},
       // Billing and purchases
@@ -266,9 +267,10 @@ TEST_F(Vlws, EveryOperationAnswers) {
        "TransactionId TransactionAuthNum"},
       {"purchased-title --title 1002 --token {AuthToken} {store}"},
       {"purchased-sku --sku 10021 --token {AuthToken} {store}"},
+      {"purchased-sku --sku 10022 --token {AuthToken} {store}"},
       {"my-videos --token {AuthToken} {store}"},
       {"rental-expiration --pass {PassID} --token {AuthToken} {store}"},
-      {"purchased-listings --passes {PassID} --token {AuthToken} {store}"},
+      {"purchased-listings --passes {PassID},999999 --token {AuthToken} {store}"},
       // The user data a file cache keeps; a new handle purges them (and the answers that carry a
       // wishlist flag), so a second run asks again. The dispatched operations of a download handle.
       {"email --token {AuthToken} {cache} {store}"},
@@ -281,8 +283,8 @@ TEST_F(Vlws, EveryOperationAnswers) {
       {"title --title 1002 --token {AuthToken} {cache} {store}"},
       // Streaming, from a download handle: these go to the streaming service whatever the access type.
       {"stream --pass {PassID} --profile 1 --access-type 1 --token {AuthToken} {store}", "StreamID"},
-      {"last-stream --pass {PassID} --profile 1 --access-type 1 --token {AuthToken} {store}"},
       {"stream-status --stream-id {StreamID} --status 2 --stop-time 60 --access-type 1 --token {AuthToken} {store}"},
+      {"last-stream --pass {PassID} --profile 1 --access-type 1 --token {AuthToken} {store}"},
       {"bonus-stream --bonus 10015 --access-type 1 --token {AuthToken} {store}"},
       {"thx --pass {PassID} --profile 1 --audio-profile 0 --access-type 1 --token {AuthToken} {store}"},
       {"thx-bonus --bonus 10015 --profile 1 --access-type 1 --token {AuthToken} {store}"},
@@ -299,7 +301,9 @@ TEST_F(Vlws, EveryOperationAnswers) {
       {"in-wishlist-titles --titles 1003,1002 --token {AuthToken} {cache} {store}"},
       {"wishlist --token {AuthToken} {cache} {store}"},
       {"wishlist-clear --token {AuthToken} {store}"},
+      {"remove-all-purchases --account-password wrong --token {AuthToken} {store}"},
       {"remove-all-purchases --account-password alicepw --token {AuthToken} {store}"},
+      {"purchased-sku --sku 10021 --token {AuthToken} {store}"},
       {"deactivate --token {AuthToken} {store}"},
       {"check-token --token {AuthToken} {store}"},
       // Settings files, files and folders
