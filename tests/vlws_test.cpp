@@ -185,52 +185,37 @@ TEST_F(Vlws, EveryOperationAnswers) {
       {"search --query Distant {store}"},
       {"search-detail --query Kestrel --items 3 {store}"},
       {"recommended --title 1001 {store}"},
-      // A file cache: what each answer is kept under (the rows of the database that come, "+ ",
-      // and go, "- "), and the same question in a new run answered by it, with no request.
-      {"navigation {cache} {store}"},
+      // A file cache ({cache} rows run twice): what each answer is kept under (the rows of the
+      // database that come, "+ ", and go, "- "), and the second run answered by it, with no request.
       {"navigation {cache} {store}"},
       {"genre-label --genre 3 {cache} {store}"},  // never kept
       {"genre-label --genre 999 {cache} {store}"},
       {"titles --genre 3 --page 2 --items 5 {cache} {store}"},
-      {"titles --genre 3 --page 2 --items 5 {cache} {store}"},
       {"titles --genre 3 --page 2 --items 4 {cache} {store}"},  // a page size of its own
       {"titles --genre 10 --items 3 --purchase-type 0 {cache} {store}"},  // rentals only
       {"titles-by-genres --genres 10,999,2 --items 1 {cache} {store}"},  // never kept
-      {"titles-by-genres --genres 10,999,2 --items 1 {cache} {store}"},
-      {"title --title 1002 {cache} {store}"},
-      {"title --title 1002 {cache} {store}"},
+      {"title --title 1002 {cache} {store}"},  // with a wishlist flag: a new handle purges both
       {"title --title 999999 {cache} {store}"},
-      {"episode --episode 50002 {cache} {store}"},
       {"episode --episode 50002 {cache} {store}"},
       {"episode --episode 1 {cache} {store}"},
       {"episodes --title 1152 {cache} {store}"},
-      {"episodes --title 1152 {cache} {store}"},
       {"episodes --title 1001 {cache} {store}"},  // a movie
-      {"episode-listings --title 1152 {cache} {store}"},
       {"episode-listings --title 1152 {cache} {store}"},
       {"episode-listings --title 999999 {cache} {store}"},  // none: not kept
       {"tivo-title --tivo-id tivo:ts.307014 {cache} {store}"},
-      {"tivo-title --tivo-id tivo:ts.307014 {cache} {store}"},
       {"tivo-title --tivo-id tivo:none {cache} {store}"},
-      {"sku-title --sku 10021 {cache} {store}"},
       {"sku-title --sku 10021 {cache} {store}"},
       {"sku-title --sku 1 {cache} {store}"},
       {"search --query harbor --items 3 {cache} {store}"},
-      {"search --query harbor --items 3 {cache} {store}"},
       {"search --query harbor --items 3 --title-type 1 {cache} {store}"},  // television only
-      {"search-detail --query 'Olive Stroud' --items 3 {cache} {store}"},
       {"search-detail --query 'Olive Stroud' --items 3 {cache} {store}"},
       // Keys far beyond 256 bytes: a cut one would serve the second query the first one's answer.
       {"search --query {long}-first --items 3 {cache} {store}"},
       {"search --query {long}-second --items 3 {cache} {store}"},
-      {"search --query {long}-first --items 3 {cache} {store}"},
-      {"search --query {long}-second --items 3 {cache} {store}"},
-      {"recommended --title 1001 {cache} {store}"},
       {"recommended --title 1001 {cache} {store}"},
       {"recommended --title 999999 {cache} {store}"},
       {"should-update-cache --time 2001-01-01T00:00:00 {cache} {store}"},
       // A cache without catalogue answers keeps none.
-      {"titles --genre 3 --cache-data 6 {cache} {store}"},
       {"titles --genre 3 --cache-data 6 {cache} {store}"},
       {"cache-load-time {store}", "Text"},
       {"should-update-cache --time '{Text}' {store}"},
@@ -272,8 +257,7 @@ TEST_F(Vlws, EveryOperationAnswers) {
       {"rental-expiration --pass {PassID} --token {AuthToken} {store}"},
       {"purchased-listings --passes {PassID},999999 --token {AuthToken} {store}"},
       // The user data a file cache keeps; a new handle purges them (and the answers that carry a
-      // wishlist flag), so a second run asks again. The dispatched operations of a download handle.
-      {"email --token {AuthToken} {cache} {store}"},
+      // wishlist flag), so the second run asks again. The dispatched operations of a download handle.
       {"email --token {AuthToken} {cache} {store}"},
       {"settings-page --token {AuthToken} {cache} {store}"},
       {"billing-info --token {AuthToken} {cache} {store}"},
@@ -328,11 +312,15 @@ TEST_F(Vlws, EveryOperationAnswers) {
   std::set<std::string> kept;
   s_Sim->ClearRequests();
   for (const Row& row : rows) {
-    VLCommandRun run = Run(row.arguments);
-    if (row.capture) m_Vars[row.capture] = Member(run.out, row.capture);
-    transcript += std::string("$ vlws ") + row.arguments + "\n" + Masked(run.out, row.varies);
-    if (run.status != 0) transcript += "exit status " + std::to_string(run.status) + ": " + Masked(run.err, nullptr);
-    transcript += Masked(Received() + CacheChanges(&kept), nullptr);
+    // A row with a file cache runs twice: the second run shows what the first one kept.
+    const int runs = std::string(row.arguments).find("{cache}") == std::string::npos ? 1 : 2;
+    for (int run = 0; run < runs; ++run) {
+      VLCommandRun ran = Run(row.arguments);
+      if (row.capture) m_Vars[row.capture] = Member(ran.out, row.capture);
+      transcript += std::string("$ vlws ") + row.arguments + "\n" + Masked(ran.out, row.varies);
+      if (ran.status != 0) transcript += "exit status " + std::to_string(ran.status) + ": " + Masked(ran.err, nullptr);
+      transcript += Masked(Received() + CacheChanges(&kept), nullptr);
+    }
     untried.erase(std::string(row.arguments).substr(0, std::string(row.arguments).find(' ')));
   }
   EXPECT_TRUE(untried.empty()) << "not tried: " << *untried.begin();
