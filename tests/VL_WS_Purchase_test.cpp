@@ -116,7 +116,7 @@ TEST_F(Purchase, TaxOfAnOrder) {
   EXPECT_TRUE(TakeLog().empty());
 }
 
-TEST_F(Purchase, BalancesAndGiftCertificates) {
+TEST_F(Purchase, BalanceAndGiftCertificateRefusals) {
   Init();
   VLAnswer<VL_WS_BillingInfoAndPPCBalance> info;
   ASSERT_EQ(VL_WS_OK, VL_WS_getBillingInfoAndPPCBalance(&m_Handle, info.Fresh()));
@@ -125,20 +125,6 @@ TEST_F(Purchase, BalancesAndGiftCertificates) {
   EXPECT_EQ(VL_WS_E_UNEXPECTED, Call(VL_WS_getBillingInfoAndPPCBalance));
 
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Call(VL_WS_assignGiftCertificateToUser, ""));
-  EXPECT_EQ(VL_WS_E_GIFT_CERTIFICATE_1, Call(VL_WS_assignGiftCertificateToUser, "GIFT-NONE"));
-  VLAnswer<VL_WS_GiftCertificateResponse> gift;
-  ASSERT_EQ(VL_WS_OK, VL_WS_assignGiftCertificateToUser(&m_Handle, "GIFT-0500", gift.Fresh()));
-  EXPECT_EQ(3000, gift->Balance);
-  EXPECT_EQ(VL_WS_E_GIFT_CERTIFICATE_2, Call(VL_WS_assignGiftCertificateToUser, "GIFT-0500"));
-
-  VLAnswer<VL_WS_PrePaidCardBalanceResponse> balance;
-  ASSERT_EQ(VL_WS_OK, VL_WS_getPrePaidCardBalance(&m_Handle, balance.Fresh()));
-  EXPECT_EQ(3000, balance->Balance);
-  EXPECT_EQ((Lines{"VL_WS_assignGiftCertificateToUser, ret:0,responseCode:1",
-                   "VL_WS_assignGiftCertificateToUser, ret:0,responseCode:0",
-                   "VL_WS_assignGiftCertificateToUser, ret:0,responseCode:2",
-                   "VL_WS_getPrePaidCardBalance, ret:0,responseCode:0"}),
-            TakeLog());
 }
 
 TEST_F(Purchase, RentalsCountDownAndPassListsNeedPasses) {

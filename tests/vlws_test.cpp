@@ -246,6 +246,8 @@ TEST_F(Vlws, EveryOperationAnswers) {
       {"billing-info --token {AuthToken} {store}"},
       {"billing-and-balance --token {AuthToken} {store}"},
       {"redeem-gift --code GIFT-1000 --token {AuthToken} {store}"},
+      {"redeem-gift --code GIFT-1000 --token {AuthToken} {store}"},  // used
+      {"redeem-gift --code GIFT-NONE --token {AuthToken} {store}"},
       {"prepaid-balance --token {AuthToken} {store}"},
       {"order-tax --sku 10021 --token {AuthToken} {store}"},
       {"purchase --sku 10021 --ip-address 127.0.0.1 --prepaid --token {AuthToken} {store}", "PassID",
@@ -272,7 +274,7 @@ TEST_F(Vlws, EveryOperationAnswers) {
       {"bonus-stream --bonus 10015 --access-type 1 --token {AuthToken} {store}"},
       {"thx --pass {PassID} --profile 1 --audio-profile 0 --access-type 1 --token {AuthToken} {store}"},
       {"thx-bonus --bonus 10015 --profile 1 --access-type 1 --token {AuthToken} {store}"},
-      {"set-audio-default --audio-profile 3 --access-type 1 --token {AuthToken} {store}"},
+      {"set-audio-default --audio-profile 0 --access-type 1 --token {AuthToken} {store}"},
       {"audio-default --access-type 1 --token {AuthToken} {store}"},
       // Wishlist
       {"wishlist-add --title 1001 --token {AuthToken} {store}"},
