@@ -72,8 +72,8 @@ class Vlws : public testing::Test {
 
   // The text with what differs from run to run replaced: the test's folder, the long query, the
   // token, the stream and the pass that rows pass on by {dir}, {long}, {AuthToken}, {StreamID} and
-  // {PassID}, and the values
-  // of the members named in varies (words separated by spaces) by <varies>.
+  // {PassID}, and the values of the members named in varies (words separated by spaces) by
+  // <varies>.
   std::string Masked(std::string text, const char* varies) const {
     for (const char* name : {"dir", "long", "AuthToken", "StreamID", "PassID"}) {
       auto var = m_Vars.find(name);
