@@ -128,8 +128,7 @@ class Vlws : public testing::Test {
   // data by Name and Key and box art by prefix and size.
   std::string CacheChanges(std::set<std::string>* kept) const {
     std::set<std::string> now;
-    for (const std::string& name : VLFolderFiles(m_Dir / "cache")) {
-      if (name.size() < 3 || name.compare(name.size() - 3, 3, ".vl") != 0) continue;
+    for (const std::string& name : VLCacheFilesIn(m_Dir / "cache")) {
       now.insert("file " + name);
       std::istringstream rows(VLRunSql(m_Dir / "cache/" + name,
                                        "SELECT 'Service', Name, Key FROM Service UNION ALL "

@@ -67,10 +67,16 @@ std::set<std::string> VLFolderFiles(const std::string& folder) {
   return names;
 }
 
-std::string VLCacheFileIn(const std::string& folder) {
+std::set<std::string> VLCacheFilesIn(const std::string& folder) {
+  std::set<std::string> names;
   for (const std::string& name : VLFolderFiles(folder))
-    if (name.size() > 3 && name.compare(name.size() - 3, 3, ".vl") == 0) return folder + name;
-  return std::string();
+    if (name.size() > 3 && name.compare(name.size() - 3, 3, ".vl") == 0) names.insert(name);
+  return names;
+}
+
+std::string VLCacheFileIn(const std::string& folder) {
+  std::set<std::string> names = VLCacheFilesIn(folder);
+  return names.empty() ? std::string() : folder + *names.begin();
 }
 
 std::string VLRunSql(const std::string& path, const std::string& sql) {

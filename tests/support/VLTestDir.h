@@ -43,7 +43,9 @@ std::string VLReadFile(const std::string& path);
 // Writes content to path (created or truncated); false on failure.
 bool VLWriteFile(const std::string& path, const std::string& content);
 
-// The cache database in a folder: the file whose name ends in ".vl" ("" when there is none).
+// The cache databases in a folder: the names of the files that end in ".vl".
+std::set<std::string> VLCacheFilesIn(const std::string& folder);
+// The cache database in a folder: the first of them as a path ("" when there is none).
 std::string VLCacheFileIn(const std::string& folder);
 
 // Runs statements on an SQLite file from outside, as another program would. The rows they give,
