@@ -13,6 +13,7 @@
 #include "VLSimServer.h"
 #include "VLTestCommand.h"
 #include "VLTestDir.h"
+#include "VLTestTranscript.h"
 
 namespace {
 
@@ -108,41 +109,6 @@ class Vlws : public testing::Test {
       }
     }
     return names;
-  }
-
-  // What the store received since the last call, a line per request: "> " and the service and
-  // operation (and the token sent, if the request had the element), or the method, host and path
-  // of a plain HTTP request. The log is emptied.
-  static std::string Received() {
-    std::string lines;
-    for (const VLSimRequest& r : s_Sim->Requests()) {
-      lines += "> " + (r.service.empty() ? r.method + " " + r.host + r.path : r.service + " " + r.operation);
-      lines += (r.hasAuthToken ? " token=" + r.authToken : "") + "\n";
-    }
-    s_Sim->ClearRequests();
-    return lines;
-  }
-
-  // The rows of the file caches in {dir}cache that came ("+ ") or went ("- ") since the rows in
-  // kept, which become the rows now: each database file's name, and its service answers and user
-  // data by Name and Key and box art by prefix and size.
-  std::string CacheChanges(std::set<std::string>* kept) const {
-    std::set<std::string> now;
-    for (const std::string& name : VLCacheFilesIn(m_Dir / "cache")) {
-      now.insert("file " + name);
-      std::istringstream rows(VLRunSql(m_Dir / "cache/" + name,
-                                       "SELECT 'Service', Name, Key FROM Service UNION ALL "
-                                       "SELECT 'Userdata', Name, Key FROM Userdata UNION ALL "
-                                       "SELECT 'BoxArt', Prefix, Dim FROM BoxArt"));
-      for (std::string row; std::getline(rows, row);) now.insert(row);
-    }
-    std::string lines;
-    for (const std::string& row : now)
-      if (!kept->count(row)) lines += "+ " + row + "\n";
-    for (const std::string& row : *kept)
-      if (!now.count(row)) lines += "- " + row + "\n";
-    *kept = now;
-    return lines;
   }
 
   static VLSimServer* s_Sim;
@@ -320,19 +286,12 @@ TEST_F(Vlws, EveryOperationAnswers) {
       if (row.capture) m_Vars[row.capture] = Member(ran.out, row.capture);
       transcript += std::string("$ vlws ") + row.arguments + "\n" + Masked(ran.out, row.varies);
       if (ran.status != 0) transcript += "exit status " + std::to_string(ran.status) + ": " + Masked(ran.err, nullptr);
-      transcript += Masked(Received() + CacheChanges(&kept), nullptr);
+      transcript += Masked(VLReceivedLines(*s_Sim) + VLCacheChanges(m_Dir / "cache", &kept), nullptr);
     }
     untried.erase(std::string(row.arguments).substr(0, std::string(row.arguments).find(' ')));
   }
   EXPECT_TRUE(untried.empty()) << "not tried: " << *untried.begin();
-  const std::string expectedFile = VL_SOURCE_DIR "/tests/data/vlws/every-operation.txt";
-  const std::string actualFile = VL_BINARY_DIR "/tests/every-operation.txt";
-  if (transcript != VLReadFile(expectedFile)) {
-    ASSERT_TRUE(VLWriteFile(actualFile, transcript));
-    ADD_FAILURE() << "vlws printed other answers than " << expectedFile << "; what it printed is in " << actualFile
-                  << " (copy it over the expected one if the change is intended):\n  diff " << expectedFile << " "
-                  << actualFile;
-  }
+  VLExpectTranscript("vlws/every-operation.txt", transcript);
 }
 
 TEST_F(Vlws, WrongUsageIsNamedAndExitsWithTwo) {

@@ -20,7 +20,14 @@ void VLJsonWriter::Bool(bool value) {
   m_Out += value ? "true" : "false";
 }
 
-void VLJsonWriter::String(const char* text) { String(text ? text : "", text ? strlen(text) : 0); }
+void VLJsonWriter::String(const char* text) {
+  if (!text) {
+    StartValue();
+    m_Out += "null";
+    return;
+  }
+  String(text, strlen(text));
+}
 
 void VLJsonWriter::String(const char* bytes, size_t length) {
   StartValue();

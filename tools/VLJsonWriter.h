@@ -29,7 +29,7 @@ class VLJsonWriter {
 
   void Int(long long value);
   void Bool(bool value);
-  // A null text is written as "": the records never hold one after a successful call.
+  // A null text is written as null: only a record that a call refused or failed holds one.
   void String(const char* text);
   void String(const char* bytes, size_t length);
 

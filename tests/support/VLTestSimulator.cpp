@@ -50,12 +50,16 @@ void VLSimClientTest::TearDown() {
   m_Sim.ClearFaults();
 }
 
-std::vector<VLSimRequest> VLSimClientTest::Requests(size_t count) {
-  m_Sim.WaitForRequests(count, 5000);
-  std::vector<VLSimRequest> log = m_Sim.Requests();
+std::vector<VLSimRequest> VLRequestsByConnection(VLSimServer& sim) {
+  std::vector<VLSimRequest> log = sim.Requests();
   std::stable_sort(log.begin(), log.end(),
                    [](const VLSimRequest& a, const VLSimRequest& b) { return a.connection < b.connection; });
   return log;
+}
+
+std::vector<VLSimRequest> VLSimClientTest::Requests(size_t count) {
+  m_Sim.WaitForRequests(count, 5000);
+  return VLRequestsByConnection(m_Sim);
 }
 
 void VLSimClientTest::Fault(const std::string& spec) {

@@ -23,6 +23,11 @@ VLSimServer& VLTestSimulator(const VLSimOptions& options = VLSimOptions());
 // in cacheData in the folder cachePath. The strings are static, but for cachePath.
 VL_WS_SetupParams VLTestSetupParams(int cacheType = 0, int cacheData = 7, const char* cachePath = nullptr);
 
+// The simulator's request log in the order the client connected: the simulator logs a request
+// as it answers it, but a failed TLS handshake only once the client has given up and may be on to
+// its next request.
+std::vector<VLSimRequest> VLRequestsByConnection(VLSimServer& sim);
+
 // Calls operation with the arguments and a record of its own, checks that the record carries a
 // tag (the given one, unless that is VL_WS_TAG_NONE) and that it is released; returns the
 // operation's status.
@@ -44,8 +49,7 @@ class VLSimClientTest : public testing::Test {
   void TearDown() override;
 
   // The request log once it holds count requests (waiting up to 5 s), in the order the client
-  // connected: the simulator logs a request as it answers it, but a failed TLS handshake only
-  // once the client has given up and may be on to its next request.
+  // connected.
   std::vector<VLSimRequest> Requests(size_t count);
   void Fault(const std::string& spec);
 

@@ -1,0 +1,224 @@
+// Client sessions: operations on one handle, one after another, as a movie makes them. Each file
+// of tests/data/sessions is a transcript: the commands of a session ("$ " lines), each followed
+// by what it printed, and comments ("#" lines) and blank lines. The test runs the commands on the
+// program's store simulator and compares the transcript it gets with the file.
+//
+// A command is a vlws operation with its own options (vlws OPERATION --help), run on the
+// session's handle, or one of:
+//   init [SETUP OPTIONS]       makes the handle anew from vlws's setup options, which start as
+//                              the simulator's device with access type 2 (streaming)
+//   release                    releases the handle: operations then get an empty one
+//   fault SPEC                 the simulator's answers fail so (the written form of VLSimFaults.h)
+//   store load-time TEXT       the catalogue's load time the store answers
+//   store device-env DIGIT     the environment the device-environment service answers
+//   store access-type N        the access type the store answers
+//   flag TITLE [0|1]           the title's wishlist flag in the handle's cache: printed, or written
+//   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
+//   cache-write NAME KEY TEXT  writes TEXT there
+// Words are separated by spaces; '...' makes one word of what it quotes. In commands, {token} is
+// the token of the simulator's account of PIN 1234 (authorised when the session starts), {dir}
+// the session's own folder and {cache} "--cache-type 2 --cache-path {dir}cache".
+//
+// What a command printed: an operation's result as vlws writes it, and when the call failed, first
+// "status NAME (number): meaning" and then the record as the call left it (a text it left null
+// shows as null); then the lines the library logged ("| "), the requests the store received
+// ("> ") and the rows the file cache in {dir}cache gained ("+ ") or lost ("- ").
+#include <dirent.h>
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <set>
+#include <sstream>
+#include <string>
+#include <vector>
+
+#include "VLTestAccountClient.h"
+#include "VLTestTranscript.h"
+#include "VLWSOperations.h"
+
+namespace {
+
+const char kSessions[] = VL_SOURCE_DIR "/tests/data/sessions/";
+
+// The names of the session files, without ".txt".
+std::vector<std::string> SessionNames() {
+  std::vector<std::string> names;
+  for (const std::string& file : VLFolderFiles(kSessions)) {
+    if (file.size() > 4 && file.compare(file.size() - 4, 4, ".txt") == 0) names.push_back(file.substr(0, file.size() - 4));
+  }
+  std::sort(names.begin(), names.end());
+  return names;
+}
+
+// The words of a command: separated by spaces, '...' quoting one word.
+std::vector<std::string> Words(const std::string& command) {
+  std::vector<std::string> words;
+  std::string word;
+  bool inWord = false, quoted = false;
+  for (char c : command) {
+    if (c == '\'') {
+      quoted = !quoted;
+      inWord = true;
+    } else if (c == ' ' && !quoted) {
+      if (inWord) words.push_back(word);
+      word.clear();
+      inWord = false;
+    } else {
+      word += c;
+      inWord = true;
+    }
+  }
+  if (inWord) words.push_back(word);
+  return words;
+}
+
+std::string Replaced(std::string text, const std::string& from, const std::string& to) {
+  for (size_t at = 0; (at = text.find(from, at)) != std::string::npos; at += to.size()) text.replace(at, from.size(), to);
+  return text;
+}
+
+class Session : public VLTestAccountClient, public testing::WithParamInterface<std::string> {
+ protected:
+  void SetUp() override {
+    VLTestAccountClient::SetUp();
+    int account = 0;
+    ASSERT_EQ(0, m_Sim.Store().Authorize(kPin, "00-11-22-33-44-55", 7, &m_Token, &account));
+    m_LoadTime = m_Sim.Store().LastCacheLoadTime();
+  }
+  void TearDown() override {
+    m_Sim.Store().SetLastCacheLoadTime(m_LoadTime);
+    m_Sim.Store().SetDeviceEnv("00-11-22-33-44-55", 2);
+    m_Sim.Store().SetAccessType(STREAM);
+    VLTestAccountClient::TearDown();
+  }
+
+  // The transcript of the session in file: its commands run, their output written anew.
+  std::string Transcript(const std::string& file) {
+    std::istringstream lines(VLReadFile(file));
+    std::string transcript;
+    std::set<std::string> kept;
+    for (std::string line; std::getline(lines, line);) {
+      if (line.compare(0, 2, "$ ") == 0) {
+        std::string printed = Command(Words(Expand(line.substr(2))));
+        for (const std::string& logged : TakeLog()) printed += "| " + logged + "\n";
+        printed += VLReceivedLines(m_Sim) + VLCacheChanges(m_Dir / "cache", &kept);
+        transcript += line + "\n" + Replaced(Replaced(printed, m_Token, "{token}"), m_Dir.path(), "{dir}");
+      } else if (line.empty() || line[0] == '#') {
+        transcript += line + "\n";
+      }
+    }
+    return transcript;
+  }
+
+  std::string Expand(const std::string& command) const {
+    std::string cache = "--cache-type 2 --cache-path " + m_Dir / "cache";
+    return Replaced(Replaced(Replaced(command, "{cache}", cache), "{dir}", m_Dir.path()), "{token}", m_Token);
+  }
+
+  // Runs a command; what it printed.
+  std::string Command(const std::vector<std::string>& words) {
+    if (words.empty()) return "usage: an empty command\n";
+    const std::string& name = words[0];
+    std::vector<std::string> rest(words.begin() + 1, words.end());
+    if (name == "init") return Init(rest);
+    if (name == "release") {
+      VL_WS_release(&m_Handle);
+      return "";
+    }
+    if (name == "fault" && rest.size() == 1) {
+      std::string error;
+      return m_Sim.AddFault(rest[0], &error) ? "" : "usage: " + error + "\n";
+    }
+    if (name == "store" && rest.size() == 2) return Store(rest[0], rest[1]);
+    if (name == "flag" || name == "cached" || name == "cache-write") {
+      return m_Handle.client && m_Handle.client->m_Cache ? CacheCommand(name, rest) : "no cache\n";
+    }
+    for (const vlws::Operation& op : vlws::Operations()) {
+      if (name == op.name) return Operation(op, rest);
+    }
+    return "usage: unknown command " + name + "\n";
+  }
+
+  std::string Init(std::vector<std::string> words) {
+    const VLSimOptions& sim = m_Sim.Options();
+    words.insert(words.begin(), {"--api-key", sim.apiKey, "--user-name", sim.userName, "--password", sim.password,
+                                 "--device-id", "00-11-22-33-44-55", "--device-type", "7", "--access-type", "2"});
+    // Later words win, so the command's own override the simulator's.
+    vlws::Operation setup = {"init", "VL_WS_initialize", "", {}, true, nullptr};
+    vlws::Args args;
+    std::string error;
+    std::vector<char*> argv;
+    for (std::string& word : words) argv.push_back(&word[0]);
+    if (vlws::ParseArgs(setup, static_cast<int>(argv.size()), argv.data(), &args, &error) != vlws::Parsed::kRun) {
+      return "usage: " + error + "\n";
+    }
+    VL_WS_release(&m_Handle);
+    VL_WS_SetupParams params = vlws::SetupParams(args);
+    VL_WS_Status status = VL_WS_initialize(&m_Handle, &params);
+    return status == VL_WS_OK ? "" : "status " + vlws::DescribeStatus(status, setup.function) + "\n";
+  }
+
+  std::string Operation(vlws::Operation op, std::vector<std::string> words) {
+    op.handle = false;  // the session's handle: the operation's own options only
+    vlws::Args args;
+    std::string error;
+    std::vector<char*> argv;
+    for (std::string& word : words) argv.push_back(&word[0]);
+    if (vlws::ParseArgs(op, static_cast<int>(argv.size()), argv.data(), &args, &error) != vlws::Parsed::kRun) {
+      return "usage: " + error + "\n";
+    }
+    VLJsonWriter json;
+    std::string detail;
+    VL_WS_Status status = op.run(args, &m_Handle, &json, &detail);
+    if (status == VL_WS_OK) return json.Text();
+    return "status " + vlws::DescribeStatus(status, op.function) + (detail.empty() ? "" : "; " + detail) + "\n" +
+           json.Text();
+  }
+
+  std::string Store(const std::string& what, const std::string& value) {
+    if (what == "load-time") {
+      m_Sim.Store().SetLastCacheLoadTime(value);
+    } else if (what == "device-env") {
+      m_Sim.Store().SetDeviceEnv("00-11-22-33-44-55", std::stoi(value));
+    } else if (what == "access-type") {
+      m_Sim.Store().SetAccessType(std::stoi(value));
+    } else {
+      return "usage: unknown store setting " + what + "\n";
+    }
+    return "";
+  }
+
+  std::string CacheCommand(const std::string& name, const std::vector<std::string>& words) {
+    if (name == "flag" && words.size() == 1) {
+      return std::to_string(Flag(std::stoi(words[0]))) + "\n";
+    }
+    if (name == "flag" && words.size() == 2) {
+      return Cache().WriteWishlistFlag(std::stoi(words[0]), words[1] == "1") ? "" : "not written\n";
+    }
+    VLString value;
+    if (name == "cached" && words.size() == 2) {
+      return Cache().ReadMetaData(words[0].c_str(), words[1].c_str(), value) ? "kept\n" : "not kept\n";
+    }
+    if (name == "cache-write" && words.size() == 3) {
+      return Cache().WriteMetaData(words[0].c_str(), words[1].c_str(), words[2].c_str()) ? "" : "not written\n";
+    }
+    return "usage: " + name + " with wrong arguments\n";
+  }
+
+  VLTestDir m_Dir;
+  std::string m_Token;
+  std::string m_LoadTime;
+};
+
+TEST_P(Session, PrintsItsTranscript) {
+  VLExpectTranscript("sessions/" + GetParam() + ".txt", Transcript(kSessions + GetParam() + ".txt"));
+}
+
+INSTANTIATE_TEST_SUITE_P(, Session, testing::ValuesIn(SessionNames()),
+                         [](const testing::TestParamInfo<std::string>& info) {
+                           std::string name = info.param;
+                           std::replace(name.begin(), name.end(), '-', '_');
+                           return name;
+                         });
+
+}  // namespace

@@ -1,0 +1,50 @@
+#include "VLTestTranscript.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <sstream>
+
+#include "VLTestDir.h"
+#include "VLTestSimulator.h"
+
+std::string VLReceivedLines(VLSimServer& sim) {
+  std::string lines;
+  for (const VLSimRequest& r : VLRequestsByConnection(sim)) {
+    lines += "> " + (r.service.empty() ? r.method + " " + r.host + r.path : r.service + " " + r.operation);
+    lines += (r.hasAuthToken ? " token=" + r.authToken : "") + "\n";
+  }
+  sim.ClearRequests();
+  return lines;
+}
+
+std::string VLCacheChanges(const std::string& folder, std::set<std::string>* kept) {
+  std::set<std::string> now;
+  for (const std::string& name : VLCacheFilesIn(folder)) {
+    now.insert("file " + name);
+    std::istringstream rows(VLRunSql(folder + "/" + name,
+                                     "SELECT 'Service', Name, Key FROM Service UNION ALL "
+                                     "SELECT 'Userdata', Name, Key FROM Userdata UNION ALL "
+                                     "SELECT 'BoxArt', Prefix, Dim FROM BoxArt"));
+    for (std::string row; std::getline(rows, row);) now.insert(row);
+  }
+  std::string lines;
+  for (const std::string& row : now)
+    if (!kept->count(row)) lines += "+ " + row + "\n";
+  for (const std::string& row : *kept)
+    if (!now.count(row)) lines += "- " + row + "\n";
+  *kept = now;
+  return lines;
+}
+
+void VLExpectTranscript(const std::string& expectedFile, const std::string& transcript) {
+  const std::string expectedPath = VL_SOURCE_DIR "/tests/data/" + expectedFile;
+  if (transcript == VLReadFile(expectedPath)) return;
+  const std::string actualPath = VL_BINARY_DIR "/tests/" + expectedFile;
+  std::error_code error;
+  std::filesystem::create_directories(std::filesystem::path(actualPath).parent_path(), error);
+  ASSERT_TRUE(VLWriteFile(actualPath, transcript));
+  ADD_FAILURE() << "the transcript differs from " << expectedPath << "; what the test got is in " << actualPath
+                << " (copy it over the expected one if the change is intended):\n  diff " << expectedPath << " "
+                << actualPath;
+}
