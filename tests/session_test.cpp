@@ -15,26 +15,40 @@
 //   flag TITLE [0|1]           the title's wishlist flag in the handle's cache: printed, or written
 //   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
 //   cache-write NAME KEY TEXT  writes TEXT there
+//   js EXPRESSION              evaluates the expression in a movie of the application (made at
+//                              the first js command) and prints its value as JSON
+//   setenv NAME [VALUE]        sets or unsets an environment variable
+//   write-file PATH TEXT       writes a file; truncate PATH N cuts one to N bytes
+//   same PATH PATH             whether two files hold the same bytes
 // Words are separated by spaces; '...' makes one word of what it quotes. In commands, {token} is
 // the token of the simulator's account of PIN 1234 (authorised when the session starts), {dir}
-// the session's own folder and {cache} "--cache-type 2 --cache-path {dir}cache".
+// the session's own folder, which is the current folder, and {cache} "--cache-type 2
+// --cache-path {dir}cache". In what commands print, these values are written as those names, and
+// the first device identifier the session made as {id}.
 //
 // What a command printed: an operation's result as vlws writes it, and when the call failed, first
 // "status NAME (number): meaning" and then the record as the call left it (a text it left null
-// shows as null); then the lines the library logged ("| "), the requests the store received
-// ("> ") and the rows the file cache in {dir}cache gained ("+ ") or lost ("- ").
-#include <dirent.h>
+// shows as null); then the lines the library logged ("| ", the settings class's with their level
+// first), the requests the store received ("> ") and the rows the file cache in {dir}cache gained
+// ("+ ") or lost ("- ").
 #include <gtest/gtest.h>
+#include <stdlib.h>
 
 #include <algorithm>
+#include <memory>
+#include <regex>
 #include <set>
 #include <sstream>
 #include <string>
 #include <vector>
 
+#include "VLStage.h"
 #include "VLTestAccountClient.h"
 #include "VLTestTranscript.h"
+#include "VLWSAELog.h"
 #include "VLWSOperations.h"
+#include "VL_Log.h"
+#include "VeloraApp.h"
 
 namespace {
 
@@ -77,6 +91,18 @@ std::string Replaced(std::string text, const std::string& from, const std::strin
   return text;
 }
 
+// A movie of the application: a stage on which the application registered its classes.
+struct Movie {
+  Movie() : stage(1), launcher(&stage), app(createApplication2()) { app->init(&launcher); }
+  ~Movie() {
+    stage.Close();
+    delete app;
+  }
+  vlplatform::Stage stage;
+  vlplatform::Launcher launcher;
+  scLauncher::IApplication2* app;
+};
+
 class Session : public VLTestAccountClient, public testing::WithParamInterface<std::string> {
  protected:
   void SetUp() override {
@@ -84,8 +110,14 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     int account = 0;
     ASSERT_EQ(0, m_Sim.Store().Authorize(kPin, "00-11-22-33-44-55", 7, &m_Token, &account));
     m_LoadTime = m_Sim.Store().LastCacheLoadTime();
+    int area = -1;
+    VL_LogRegisterArea("VL_WSCFGAE", &area);
+    VL_LogActivateArea(area, 1);
+    VL_LogSetObserver(Observe, this);
   }
   void TearDown() override {
+    m_Movie.reset();
+    for (const std::string& name : m_Variables) unsetenv(name.c_str());
     m_Sim.Store().SetLastCacheLoadTime(m_LoadTime);
     m_Sim.Store().SetDeviceEnv("00-11-22-33-44-55", 2);
     m_Sim.Store().SetAccessType(STREAM);
@@ -99,15 +131,28 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     std::set<std::string> kept;
     for (std::string line; std::getline(lines, line);) {
       if (line.compare(0, 2, "$ ") == 0) {
-        std::string printed = Command(Words(Expand(line.substr(2))));
-        for (const std::string& logged : TakeLog()) printed += "| " + logged + "\n";
+        // A script keeps its quotes.
+        std::string command = Expand(line.substr(2));
+        std::string printed = command.compare(0, 3, "js ") == 0 ? Js(command.substr(3)) : Command(Words(command));
+        for (const std::string& logged : m_Lines) printed += "| " + logged + "\n";
+        m_Lines.clear();
         printed += VLReceivedLines(m_Sim) + VLCacheChanges(m_Dir / "cache", &kept);
-        transcript += line + "\n" + Replaced(Replaced(printed, m_Token, "{token}"), m_Dir.path(), "{dir}");
+        transcript += line + "\n" + Masked(printed);
       } else if (line.empty() || line[0] == '#') {
         transcript += line + "\n";
       }
     }
     return transcript;
+  }
+
+  // The output with the token, the folder and the first device identifier the session made
+  // written as {token}, {dir} and {id}.
+  std::string Masked(const std::string& printed) {
+    static const std::regex id("[0-9A-F]{2}(-[0-9A-F]{2}){5}");
+    std::smatch made;
+    if (m_Id.empty() && std::regex_search(printed, made, id) && made.str() != "00-11-22-33-44-55") m_Id = made.str();
+    std::string text = Replaced(Replaced(printed, m_Token, "{token}"), m_Dir.path(), "{dir}");
+    return m_Id.empty() ? text : Replaced(text, m_Id, "{id}");
   }
 
   std::string Expand(const std::string& command) const {
@@ -130,6 +175,16 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       return m_Sim.AddFault(rest[0], &error) ? "" : "usage: " + error + "\n";
     }
     if (name == "store" && rest.size() == 2) return Store(rest[0], rest[1]);
+    if (name == "setenv" && rest.size() == 1) return unsetenv(rest[0].c_str()) == 0 ? "" : "not unset\n";
+    if (name == "setenv" && rest.size() == 2) {
+      m_Variables.push_back(rest[0]);
+      return setenv(rest[0].c_str(), rest[1].c_str(), 1) == 0 ? "" : "not set\n";
+    }
+    if (name == "write-file" && rest.size() == 2) return VLWriteFile(rest[0], rest[1]) ? "" : "not written\n";
+    if (name == "truncate" && rest.size() == 2) {
+      return VLWriteFile(rest[0], VLReadFile(rest[0]).substr(0, std::stoul(rest[1]))) ? "" : "not written\n";
+    }
+    if (name == "same" && rest.size() == 2) return VLReadFile(rest[0]) == VLReadFile(rest[1]) ? "same\n" : "different\n";
     if (name == "flag" || name == "cached" || name == "cache-write") {
       return m_Handle.client && m_Handle.client->m_Cache ? CacheCommand(name, rest) : "no cache\n";
     }
@@ -137,6 +192,14 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       if (name == op.name) return Operation(op, rest);
     }
     return "usage: unknown command " + name + "\n";
+  }
+
+  std::string Js(const std::string& expression) {
+    if (!m_Movie) m_Movie.reset(new Movie);
+    if (!m_Movie->stage.Evaluate("movie.js", "var answer = JSON.stringify(" + expression + ");")) {
+      return "error: " + m_Movie->stage.Error() + "\n";
+    }
+    return std::string(m_Movie->stage.Global().GetProperty("answer").AsString().CString()) + "\n";
   }
 
   std::string Init(std::vector<std::string> words) {
@@ -205,8 +268,23 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     return "usage: " + name + " with wrong arguments\n";
   }
 
+  // The library's result lines, and every line of the settings class with its level.
+  static void Observe(void* self, const char* area, int level, const char* text, size_t length) {
+    if (length > 0 && text[length - 1] == '\n') --length;
+    if (std::string(area) == VLWSAELOG_AREA_NAME && level == 4) {
+      static_cast<Session*>(self)->m_Lines.push_back(std::string(text, length));
+    } else if (std::string(area) == "VL_WSCFGAE") {
+      static_cast<Session*>(self)->m_Lines.push_back(std::to_string(level) + ":" + std::string(text, length));
+    }
+  }
+
   VLTestDir m_Dir;
+  VLScopedCurrentDir m_Cwd{m_Dir.path()};
+  std::unique_ptr<Movie> m_Movie;
+  std::vector<std::string> m_Lines;
+  std::vector<std::string> m_Variables;
   std::string m_Token;
+  std::string m_Id;
   std::string m_LoadTime;
 };
 
