@@ -13,10 +13,9 @@
 #include <vector>
 
 #include "DUDUVudAE.h"
-#include "VLStage.h"
 #include "VLTestDir.h"
+#include "VLTestMovie.h"
 #include "VLTestSimulator.h"
-#include "VeloraApp.h"
 
 namespace {
 
@@ -68,23 +67,26 @@ std::string PlayMovie(const std::string& file, const std::vector<std::string>& f
                             o.password + "', sourceDir: '" VL_SOURCE_DIR "'};";
   testing::internal::CaptureStdout();
   testing::internal::CaptureStderr();  // where the console log target writes
-  vlplatform::Stage stage(2);
-  vlplatform::Launcher launcher(&stage);
-  scLauncher::IApplication2* app = createApplication2();
-  app->init(&launcher);
-  stage.RegisterExtensionClass(ae::stagecraft::DescribeExtensionClass<SimProbe>());
-  if (stage.Evaluate("setup.js", setup) && stage.EvaluateFile(kMovies + "common.js") &&
-      (file.empty() ? stage.Evaluate("inline.js", source) : stage.EvaluateFile(kMovies + file))) {
-    stage.RunFrames();
+  bool finished = false;
+  int exitStatus = 0;
+  std::string error;
+  {
+    VLTestMovie movie(2);
+    vlplatform::Stage& stage = movie.stage;
+    stage.RegisterExtensionClass(ae::stagecraft::DescribeExtensionClass<SimProbe>());
+    if (stage.Evaluate("setup.js", setup) && stage.EvaluateFile(kMovies + "common.js") &&
+        (file.empty() ? stage.Evaluate("inline.js", source) : stage.EvaluateFile(kMovies + file))) {
+      stage.RunFrames();
+    }
+    finished = stage.Global().GetProperty("finished").AsBoolean();
+    exitStatus = stage.ExitStatus();
+    error = stage.Error();
   }
-  bool finished = stage.Global().GetProperty("finished").AsBoolean();
-  stage.Close();
-  delete app;  // which waits for the deletion of objects dropped while their request ran
   std::string output = testing::internal::GetCapturedStdout() + testing::internal::GetCapturedStderr();
   sim.ClearFaults();
-  EXPECT_TRUE(stage.ExitStatus() == 0 && finished)
-      << "exit status " << stage.ExitStatus() << (finished ? "" : ", the movie did not reach its end") << "\n"
-      << stage.Error() << "\n--- movie output ---\n" << output;
+  EXPECT_TRUE(exitStatus == 0 && finished)
+      << "exit status " << exitStatus << (finished ? "" : ", the movie did not reach its end") << "\n"
+      << error << "\n--- movie output ---\n" << output;
   return output;
 }
 

@@ -16,7 +16,7 @@
 //   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
 //   cache-write NAME KEY TEXT  writes TEXT there
 //   js EXPRESSION              evaluates the expression in a movie of the application (made at
-//                              the first js command) and prints its value as JSON
+//                              the first js command) and prints its value as JSON (or undefined)
 //   setenv NAME [VALUE]        sets or unsets an environment variable
 //   write-file PATH TEXT       writes a file; truncate PATH N cuts one to N bytes
 //   same PATH PATH             whether two files hold the same bytes
@@ -29,8 +29,8 @@
 // What a command printed: an operation's result as vlws writes it, and when the call failed, first
 // "status NAME (number): meaning" and then the record as the call left it (a text it left null
 // shows as null); then the lines the library logged ("| ", the settings class's with their level
-// first), the requests the store received ("> ") and the rows the file cache in {dir}cache gained
-// ("+ ") or lost ("- ").
+// first, and none that trace entering or leaving a function), the requests the store received
+// ("> ") and the rows the file cache in {dir}cache gained ("+ ") or lost ("- ").
 #include <gtest/gtest.h>
 #include <stdlib.h>
 
@@ -42,13 +42,12 @@
 #include <string>
 #include <vector>
 
-#include "VLStage.h"
 #include "VLTestAccountClient.h"
+#include "VLTestMovie.h"
 #include "VLTestTranscript.h"
 #include "VLWSAELog.h"
 #include "VLWSOperations.h"
 #include "VL_Log.h"
-#include "VeloraApp.h"
 
 namespace {
 
@@ -90,18 +89,6 @@ std::string Replaced(std::string text, const std::string& from, const std::strin
   for (size_t at = 0; (at = text.find(from, at)) != std::string::npos; at += to.size()) text.replace(at, from.size(), to);
   return text;
 }
-
-// A movie of the application: a stage on which the application registered its classes.
-struct Movie {
-  Movie() : stage(1), launcher(&stage), app(createApplication2()) { app->init(&launcher); }
-  ~Movie() {
-    stage.Close();
-    delete app;
-  }
-  vlplatform::Stage stage;
-  vlplatform::Launcher launcher;
-  scLauncher::IApplication2* app;
-};
 
 class Session : public VLTestAccountClient, public testing::WithParamInterface<std::string> {
  protected:
@@ -195,8 +182,8 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
   }
 
   std::string Js(const std::string& expression) {
-    if (!m_Movie) m_Movie.reset(new Movie);
-    if (!m_Movie->stage.Evaluate("movie.js", "var answer = JSON.stringify(" + expression + ");")) {
+    if (!m_Movie) m_Movie.reset(new VLTestMovie);
+    if (!m_Movie->stage.Evaluate("movie.js", "var answer = String(JSON.stringify(" + expression + "));")) {
       return "error: " + m_Movie->stage.Error() + "\n";
     }
     return std::string(m_Movie->stage.Global().GetProperty("answer").AsString().CString()) + "\n";
@@ -268,19 +255,22 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     return "usage: " + name + " with wrong arguments\n";
   }
 
-  // The library's result lines, and every line of the settings class with its level.
+  // The library's result lines, and every line of the settings class with its level; but not the
+  // lines that trace entering and leaving a function.
   static void Observe(void* self, const char* area, int level, const char* text, size_t length) {
     if (length > 0 && text[length - 1] == '\n') --length;
+    std::string line(text, length);
+    if (line.compare(0, 9, "Entering ") == 0 || line.compare(0, 8, "Exiting ") == 0) return;
     if (std::string(area) == VLWSAELOG_AREA_NAME && level == 4) {
-      static_cast<Session*>(self)->m_Lines.push_back(std::string(text, length));
+      static_cast<Session*>(self)->m_Lines.push_back(line);
     } else if (std::string(area) == "VL_WSCFGAE") {
-      static_cast<Session*>(self)->m_Lines.push_back(std::to_string(level) + ":" + std::string(text, length));
+      static_cast<Session*>(self)->m_Lines.push_back(std::to_string(level) + ":" + line);
     }
   }
 
   VLTestDir m_Dir;
   VLScopedCurrentDir m_Cwd{m_Dir.path()};
-  std::unique_ptr<Movie> m_Movie;
+  std::unique_ptr<VLTestMovie> m_Movie;
   std::vector<std::string> m_Lines;
   std::vector<std::string> m_Variables;
   std::string m_Token;
