@@ -1,6 +1,5 @@
 // The box-art operations against the store simulator's image host, beyond the sessions
-// boxart-*.txt: the conditional GET that revalidates a marked image, with either cache, and what
-// only the C interface can pass.
+// boxart-*.txt: the conditional GET that revalidates a marked image, with either cache.
 #include <gtest/gtest.h>
 
 #include <string>
@@ -79,19 +78,6 @@ TEST_F(BoxArt, MarkedImagesAreRevalidatedWithAConditionalGet) {
   m_Sim.ClearRequests();
   EXPECT_EQ(Served("t1002_"), Data("t1002_"));
   EXPECT_EQ(1u, Requests(1).size());
-}
-
-TEST_F(BoxArt, NullArgumentsAreRefused) {
-  Init(2);
-  VL_WS_String location;
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(nullptr, VL_WS_BOXART_95, "t1001_", &location));
-  VL_WS_release(&location);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(&m_Handle, VL_WS_BOXART_95, nullptr, &location));
-  VL_WS_release(&location);
-  VL_WS_Image image;
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImageData(&m_Handle, VL_WS_BOXART_95, nullptr, &image));
-  VL_WS_release(&image);
-  EXPECT_TRUE(m_Sim.Requests().empty());
 }
 
 }  // namespace

@@ -1,5 +1,6 @@
-// Catalogue operations beyond the sessions catalog-*.txt: what only the C interface can pass (null
-// texts, arrays and results, negative counts) and the files VL_WS_clearLocalCache removes.
+// Catalogue and box-art operations beyond the sessions catalog-*.txt and boxart-*.txt: what only
+// the C interface can pass (null texts, arrays and results, no handle, counts below 1) and the
+// files VL_WS_clearLocalCache removes.
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 
@@ -30,6 +31,11 @@ TEST_F(Catalog, NullArgumentsAreRefusedBeforeAnyRequest) {
   EXPECT_FALSE(update);
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_shouldUpdateCache(&m_Handle, "2001-01-01T00:00:00", nullptr));
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_clearLocalCache(nullptr));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Call(VL_WS_getBoxArtImage, VL_WS_BOXART_95, none));
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, Call(VL_WS_getBoxArtImageData, VL_WS_BOXART_95, none));
+  VL_WS_String location;
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getBoxArtImage(nullptr, VL_WS_BOXART_95, "t1001_", &location));
+  VL_WS_release(&location);
   EXPECT_TRUE(RequestsNow().empty());
 }
 
