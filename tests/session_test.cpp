@@ -20,6 +20,8 @@
 //   setenv NAME [VALUE]        sets or unsets an environment variable
 //   write-file PATH TEXT       writes a file; truncate PATH N cuts one to N bytes
 //   same PATH PATH             whether two files hold the same bytes
+//   files FOLDER               the names in the folder, one a line
+//   sql STATEMENT              the rows the statement gives on the file cache in {dir}cache
 // Words are separated by spaces; '...' makes one word of what it quotes. In commands, {token} is
 // the token of the simulator's account of PIN 1234 (authorised when the session starts), {dir}
 // the session's own folder, which is the current folder, and {cache} "--cache-type 2
@@ -175,6 +177,12 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     if (name == "flag" || name == "cached" || name == "cache-write") {
       return m_Handle.client && m_Handle.client->m_Cache ? CacheCommand(name, rest) : "no cache\n";
     }
+    if (name == "files" && rest.size() == 1) return Files(rest[0]);
+    if (name == "sql" && rest.size() == 1) {
+      std::string file = VLCacheFileIn(m_Dir / "cache/");
+      std::string rows = file.empty() ? "no cache file" : VLRunSql(file, rest[0]);
+      return (rows.empty() ? "no rows" : rows) + "\n";
+    }
     for (const vlws::Operation& op : vlws::Operations()) {
       if (name == op.name) return Operation(op, rest);
     }
@@ -236,6 +244,12 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       return "usage: unknown store setting " + what + "\n";
     }
     return "";
+  }
+
+  std::string Files(const std::string& folder) {
+    std::string names;
+    for (const std::string& name : VLFolderFiles(folder)) names += name + "\n";
+    return names.empty() ? "no files\n" : names;
   }
 
   std::string CacheCommand(const std::string& name, const std::vector<std::string>& words) {
