@@ -6,9 +6,12 @@
 #include <stdlib.h>
 
 #include <map>
+#include <regex>
 #include <set>
 #include <sstream>
 #include <string>
+#include <utility>
+#include <vector>
 
 #include "VLSimServer.h"
 #include "VLTestCommand.h"
@@ -118,177 +121,44 @@ class Vlws : public testing::Test {
 
 VLSimServer* Vlws::s_Sim = nullptr;
 
-// Every operation; the whole transcript, each row's command, what it printed (its status and
-// standard error too when it failed), the requests it sent ("> ") and the rows its file cache
-// gained ("+ ") or lost ("- "), is compared with tests/data/vlws/every-operation.txt.
-// An intended change of the output: the test writes the transcript it got next to its build
-// output and names both files; read the diff and copy the new transcript over the old one.
+// Every operation, run as at a shell: tests/data/vlws/every-operation.txt is the transcript of
+// a session in the order it needs (a token from authorize, a pass from a purchase, a stream from
+// the pass). Each "$ vlws ARGUMENTS" line of it is run, after each {name} in it is replaced by its
+// value, and followed by what it printed (its exit status and standard error too when it failed),
+// the requests the store received ("> ") and the rows its file cache gained ("+ ") or lost ("- ");
+// the test compares the transcript it gets with the file. A member whose value differs from run
+// to run or from machine to machine is <varies> in the file, and masked so in what the row
+// printed. The first AuthToken, PassID and StreamID that rows print are passed on to later rows
+// as {AuthToken}, {PassID} and {StreamID}.
 TEST_F(Vlws, EveryOperationAnswers) {
-  struct Row {
-    const char* arguments;
-    const char* capture = nullptr;  // a member of the answer kept as {capture} for later rows
-    const char* varies = nullptr;   // members of the answer whose values differ from run to run
-                                    // or from machine to machine
-  };
-  const Row rows[] = {
-      {"version"},
-      {"env-list"},
-      {"device-id", nullptr, "Text"},  // the machine's
-      {"server-time", nullptr, "serverTime"},
-      // Catalogue; the first row has the setup as options instead of the settings file.
-      {"navigation --api-key VLSIM-API-KEY --user-name vlsim-user --password '{password}' "
-       "--device-id 00-11-22-33-44-55"},
-      {"genre-label --genre 3 {store}"},
-      {"titles --genre 3 --page 2 --items 5 {store}"},
-      {"titles-by-genres --genres 3,10 --items 2 {store}"},
-      {"title --title 1001 {store}"},
-      {"episode --episode 50001 {store}"},
-      {"episodes --title 1151 {store}"},
-      {"episode-listings --title 1151 {store}"},
-      {"tivo-title --tivo-id tivo:ts.307014 {store}"},
-      {"sku-title --sku 10012 {store}"},
-      {"search --query Distant {store}"},
-      {"search-detail --query Kestrel --items 3 {store}"},
-      {"recommended --title 1001 {store}"},
-      // A file cache ({cache} rows run twice): what each answer is kept under (the rows of the
-      // database that come, "+ ", and go, "- "), and the second run answered by it, with no request.
-      {"navigation {cache} {store}"},
-      {"genre-label --genre 3 {cache} {store}"},  // never kept
-      {"genre-label --genre 999 {cache} {store}"},
-      {"titles --genre 3 --page 2 --items 5 {cache} {store}"},
-      {"titles --genre 3 --page 2 --items 4 {cache} {store}"},  // a page size of its own
-      {"titles --genre 10 --items 3 --purchase-type 0 {cache} {store}"},  // rentals only
-      {"titles-by-genres --genres 10,999,2 --items 1 {cache} {store}"},  // never kept
-      {"title --title 1002 {cache} {store}"},  // with a wishlist flag: a new handle purges both
-      {"title --title 999999 {cache} {store}"},
-      {"episode --episode 50002 {cache} {store}"},
-      {"episode --episode 1 {cache} {store}"},
-      {"episodes --title 1152 {cache} {store}"},
-      {"episodes --title 1001 {cache} {store}"},  // a movie
-      {"episode-listings --title 1152 {cache} {store}"},
-      {"episode-listings --title 999999 {cache} {store}"},  // none: not kept
-      {"tivo-title --tivo-id tivo:ts.307014 {cache} {store}"},
-      {"tivo-title --tivo-id tivo:none {cache} {store}"},
-      {"sku-title --sku 10021 {cache} {store}"},
-      {"sku-title --sku 1 {cache} {store}"},
-      {"search --query harbor --items 3 {cache} {store}"},
-      {"search --query harbor --items 3 --title-type 1 {cache} {store}"},  // television only
-      {"search-detail --query 'Olive Stroud' --items 3 {cache} {store}"},
-      // Keys far beyond 256 bytes: a cut one would serve the second query the first one's answer.
-      {"search --query {long}-first --items 3 {cache} {store}"},
-      {"search --query {long}-second --items 3 {cache} {store}"},
-      {"recommended --title 1001 {cache} {store}"},
-      {"recommended --title 999999 {cache} {store}"},
-      {"should-update-cache --time 2001-01-01T00:00:00 {cache} {store}"},
-      // A cache without catalogue answers keeps none.
-      {"titles --genre 3 --cache-data 6 {cache} {store}"},
-      {"cache-load-time {store}", "Text"},
-      {"should-update-cache --time '{Text}' {store}"},
-      {"update-cache --cache-type 2 --cache-path {dir}cache {store}"},
-      {"boxart --size 1 --prefix t1001_ --cache-type 2 --cache-path {dir}cache {store}", nullptr, "Length"},
-      {"boxart-data --size 1 --prefix t1001_ {store}"},  // JPEG bytes in Base64
-      {"clear-cache --folder {dir}cache"},
-      // Device and network
-      {"default-env {store}"},
-      {"device-env --env 1 {store}"},
-      {"file-type {store}"},
-      {"user-agent --firmware-version 4.2 --app-revision rev-7 --model-number BDP-1 {store}"},
-      {"local-ip {store}"},
-      {"bandwidth {store}", nullptr, "bitsPerSecond"},
-      {"config {store}"},
-      // The account: authorize prints the token that the later rows pass.
-      {"authorize --pin 1234 {store}", "AuthToken"},
-      {"check-token --token {AuthToken} {store}"},
-      {"email --token {AuthToken} {store}"},
-      {"settings-page --token {AuthToken} {store}"},
-      {"country --token {AuthToken} {store}"},
-      {"adult-verification --token {AuthToken} {store}"},
-      {"adult-pin --pin 7 --token {AuthToken} {store}"},  // the account's "0007"
-      {"adult-pin --pin 70007 --token {AuthToken} {store}"},
-      {"return-error --access-type 1 --token {AuthToken} {store}"},
-      {"return-timeout --access-type 1 --token {AuthToken} {store}"},
-      // Billing and purchases
-      {"billing-info --token {AuthToken} {store}"},
-      {"billing-and-balance --token {AuthToken} {store}"},
-      {"redeem-gift --code GIFT-1000 --token {AuthToken} {store}"},
-      {"redeem-gift --code GIFT-1000 --token {AuthToken} {store}"},  // used
-      {"redeem-gift --code GIFT-NONE --token {AuthToken} {store}"},
-      {"prepaid-balance --token {AuthToken} {store}"},
-      {"order-tax --sku 10021 --token {AuthToken} {store}"},
-      {"purchase --sku 10021 --ip-address 127.0.0.1 --prepaid --token {AuthToken} {store}", "PassID",
-       "TransactionId TransactionAuthNum"},
-      {"purchased-title --title 1002 --token {AuthToken} {store}"},
-      {"purchased-sku --sku 10021 --token {AuthToken} {store}"},
-      {"purchased-sku --sku 10022 --token {AuthToken} {store}"},
-      {"my-videos --token {AuthToken} {store}"},
-      {"rental-expiration --pass {PassID} --token {AuthToken} {store}"},
-      {"purchased-listings --passes {PassID},999999 --token {AuthToken} {store}"},
-      // The user data a file cache keeps; a new handle purges them (and the answers that carry a
-      // wishlist flag), so the second run asks again. The dispatched operations of a download handle.
-      {"email --token {AuthToken} {cache} {store}"},
-      {"settings-page --token {AuthToken} {cache} {store}"},
-      {"billing-info --token {AuthToken} {cache} {store}"},
-      {"my-videos --token {AuthToken} {cache} {store}"},
-      {"my-videos --access-type 1 --token {AuthToken} {cache} {store}"},  // not kept
-      {"purchased-title --title 1002 --access-type 1 --token {AuthToken} {store}"},
-      {"title --title 1002 --token {AuthToken} {cache} {store}"},
-      // Streaming, from a download handle: these go to the streaming service whatever the access type.
-      {"stream --pass {PassID} --profile 1 --access-type 1 --token {AuthToken} {store}", "StreamID"},
-      {"stream-status --stream-id {StreamID} --status 2 --stop-time 60 --access-type 1 --token {AuthToken} {store}"},
-      {"last-stream --pass {PassID} --profile 1 --access-type 1 --token {AuthToken} {store}"},
-      {"bonus-stream --bonus 10015 --access-type 1 --token {AuthToken} {store}"},
-      {"thx --pass {PassID} --profile 1 --audio-profile 0 --access-type 1 --token {AuthToken} {store}"},
-      {"thx-bonus --bonus 10015 --profile 1 --access-type 1 --token {AuthToken} {store}"},
-      {"set-audio-default --audio-profile 0 --access-type 1 --token {AuthToken} {store}"},
-      {"audio-default --access-type 1 --token {AuthToken} {store}"},
-      // Wishlist
-      {"wishlist-add --title 1001 --token {AuthToken} {store}"},
-      {"wishlist-add --title 1003 --token {AuthToken} {store}"},
-      {"in-wishlist --title 1001 --token {AuthToken} {store}"},
-      {"in-wishlist-titles --titles 1001,1002 --token {AuthToken} {store}"},
-      {"wishlist-remove --title 1001 --token {AuthToken} {store}"},
-      {"wishlist --token {AuthToken} {store}"},
-      {"in-wishlist --title 1003 --token {AuthToken} {cache} {store}"},
-      {"in-wishlist-titles --titles 1003,1002 --token {AuthToken} {cache} {store}"},
-      {"wishlist --token {AuthToken} {cache} {store}"},
-      {"wishlist-clear --token {AuthToken} {store}"},
-      {"remove-all-purchases --account-password wrong --token {AuthToken} {store}"},
-      {"remove-all-purchases --account-password alicepw --token {AuthToken} {store}"},
-      {"purchased-sku --sku 10021 --token {AuthToken} {store}"},
-      {"deactivate --token {AuthToken} {store}"},
-      {"check-token --token {AuthToken} {store}"},
-      // Settings files, files and folders
-      {"write-setting --file {dir}s.xml --key pin --value 2468 --encrypted"},
-      {"read-setting --file {dir}s.xml --key pin --encrypted"},
-      {"read-setting --file {dir}s.xml --key pin", nullptr, "Text"},  // encrypted anew by each write
-      {"read-setting --file {dir}s.xml --key other"},
-      {"create-env-xml --source {dir}s.xml --destination {dir}env.xml"},
-      {"delete-env-xml --file {dir}env.xml"},
-      {"md5sum --file {dir}store.conf", nullptr, "Length"},  // of a path in the temporary folder
-      {"copy-file --source {dir}s.xml --destination {dir}copy.xml"},
-      {"file-exists --path {dir}copy.xml"},
-      {"remove-file --file {dir}copy.xml"},
-      {"file-exists --path {dir}copy.xml"},
-      {"create-folder --path {dir}a/b"},
-      {"folder-exists --path {dir}a/b"},
-      {"folder-name --path /x/y.xml"},
-  };
+  std::vector<std::pair<std::string, std::string>> rows;  // arguments, and what the file says they print
+  std::istringstream file(VLReadFile(VL_SOURCE_DIR "/tests/data/vlws/every-operation.txt"));
+  for (std::string line; std::getline(file, line);) {
+    if (line.compare(0, 7, "$ vlws ") == 0) {
+      rows.push_back({line.substr(7), ""});
+    } else if (!rows.empty()) {
+      rows.back().second += line + "\n";
+    }
+  }
   std::set<std::string> untried = Operations();
   EXPECT_LT(70u, untried.size());
   std::string transcript;
   std::set<std::string> kept;
   s_Sim->ClearRequests();
-  for (const Row& row : rows) {
-    // A row with a file cache runs twice: the second run shows what the first one kept.
-    const int runs = std::string(row.arguments).find("{cache}") == std::string::npos ? 1 : 2;
-    for (int run = 0; run < runs; ++run) {
-      VLCommandRun ran = Run(row.arguments);
-      if (row.capture) m_Vars[row.capture] = Member(ran.out, row.capture);
-      transcript += std::string("$ vlws ") + row.arguments + "\n" + Masked(ran.out, row.varies);
-      if (ran.status != 0) transcript += "exit status " + std::to_string(ran.status) + ": " + Masked(ran.err, nullptr);
-      transcript += Masked(VLReceivedLines(*s_Sim) + VLCacheChanges(m_Dir / "cache", &kept), nullptr);
+  for (const auto& row : rows) {
+    VLCommandRun ran = Run(row.first);
+    for (const char* name : {"AuthToken", "PassID", "StreamID"}) {
+      if (!m_Vars.count(name) && !Member(ran.out, name).empty()) m_Vars[name] = Member(ran.out, name);
     }
-    untried.erase(std::string(row.arguments).substr(0, std::string(row.arguments).find(' ')));
+    std::string varies;
+    static const std::regex masked("\"(\\w+)\": <varies>");
+    for (std::sregex_iterator it(row.second.begin(), row.second.end(), masked), end; it != end; ++it) {
+      varies += (*it)[1].str() + " ";
+    }
+    transcript += "$ vlws " + row.first + "\n" + Masked(ran.out, varies.c_str());
+    if (ran.status != 0) transcript += "exit status " + std::to_string(ran.status) + ": " + Masked(ran.err, nullptr);
+    transcript += Masked(VLReceivedLines(*s_Sim) + VLCacheChanges(m_Dir / "cache", &kept), nullptr);
+    untried.erase(row.first.substr(0, row.first.find(' ')));
   }
   EXPECT_TRUE(untried.empty()) << "not tried: " << *untried.begin();
   VLExpectTranscript("vlws/every-operation.txt", transcript);
