@@ -12,12 +12,16 @@
 //   store load-time TEXT       the catalogue's load time the store answers
 //   store device-env DIGIT     the environment the device-environment service answers
 //   store access-type N        the access type the store answers
+//   store revoke TOKEN         the store forgets the device's token
+//   store clock SECONDS        the store's clock moves on (back when negative): rentals expire
+//   store wishlist N           titles 1001 to 1000+N are added to the account's wishlist in order
 //   flag TITLE [0|1]           the title's wishlist flag in the handle's cache: printed, or written
 //   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
 //   cache-write NAME KEY TEXT  writes TEXT there
 // Words are separated by spaces; '...' makes one word of what it quotes. In commands, {token} is
 // the token of the simulator's account of PIN 1234 (authorised when the session starts), {dir}
-// the session's own folder and {cache} "--cache-type 2 --cache-path {dir}cache".
+// the session's own folder and {cache} "--cache-type 2 --cache-path {dir}cache". Tokens the store
+// issues during the session print as {token2}, {token3}, ... in the order they first show.
 //
 // What a command printed: an operation's result as vlws writes it, and when the call failed, first
 // "status NAME (number): meaning" and then the record as the call left it (a text it left null
@@ -84,6 +88,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     int account = 0;
     ASSERT_EQ(0, m_Sim.Store().Authorize(kPin, "00-11-22-33-44-55", 7, &m_Token, &account));
     m_LoadTime = m_Sim.Store().LastCacheLoadTime();
+    m_Issued = {m_Token};
   }
   void TearDown() override {
     m_Sim.Store().SetLastCacheLoadTime(m_LoadTime);
@@ -102,12 +107,29 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
         std::string printed = Command(Words(Expand(line.substr(2))));
         for (const std::string& logged : TakeLog()) printed += "| " + logged + "\n";
         printed += VLReceivedLines(m_Sim) + VLCacheChanges(m_Dir / "cache", &kept);
-        transcript += line + "\n" + Replaced(Replaced(printed, m_Token, "{token}"), m_Dir.path(), "{dir}");
+        transcript += line + "\n" + Replaced(MaskTokens(printed), m_Dir.path(), "{dir}");
       } else if (line.empty() || line[0] == '#') {
         transcript += line + "\n";
       }
     }
     return transcript;
+  }
+
+  std::string MaskTokens(std::string text) {
+    for (size_t at = 0; (at = text.find("SIMTOKEN-", at)) != std::string::npos;) {
+      size_t end = text.find_first_not_of("0123456789-", at + 9);
+      std::string token = text.substr(at, end - at);
+      if (end == at + 9) {  // not one the store issues, e.g. "SIMTOKEN-UNKNOWN"
+        at = end;
+        continue;
+      }
+      size_t n = std::find(m_Issued.begin(), m_Issued.end(), token) - m_Issued.begin();
+      if (n == m_Issued.size()) m_Issued.push_back(token);
+      std::string name = n == 0 ? "{token}" : "{token" + std::to_string(n + 1) + "}";
+      text.replace(at, token.size(), name);
+      at += name.size();
+    }
+    return text;
   }
 
   std::string Expand(const std::string& command) const {
@@ -182,6 +204,12 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       m_Sim.Store().SetDeviceEnv("00-11-22-33-44-55", std::stoi(value));
     } else if (what == "access-type") {
       m_Sim.Store().SetAccessType(std::stoi(value));
+    } else if (what == "revoke") {
+      m_Sim.Store().Deactivate(value, "00-11-22-33-44-55");
+    } else if (what == "clock") {
+      m_Sim.Store().AdvanceClock(std::stol(value));
+    } else if (what == "wishlist") {
+      for (int title = 1001; title <= 1000 + std::stoi(value); ++title) m_Sim.Store().WishlistAdd(Account(), title);
     } else {
       return "usage: unknown store setting " + what + "\n";
     }
@@ -207,6 +235,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
 
   VLTestDir m_Dir;
   std::string m_Token;
+  std::vector<std::string> m_Issued;  // the store's tokens in the order they showed, m_Token first
   std::string m_LoadTime;
 };
 
