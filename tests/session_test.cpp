@@ -31,6 +31,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <regex>
 #include <set>
 #include <sstream>
 #include <string>
@@ -115,21 +116,19 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     return transcript;
   }
 
-  std::string MaskTokens(std::string text) {
-    for (size_t at = 0; (at = text.find("SIMTOKEN-", at)) != std::string::npos;) {
-      size_t end = text.find_first_not_of("0123456789-", at + 9);
-      std::string token = text.substr(at, end - at);
-      if (end == at + 9) {  // not one the store issues, e.g. "SIMTOKEN-UNKNOWN"
-        at = end;
-        continue;
-      }
-      size_t n = std::find(m_Issued.begin(), m_Issued.end(), token) - m_Issued.begin();
-      if (n == m_Issued.size()) m_Issued.push_back(token);
-      std::string name = n == 0 ? "{token}" : "{token" + std::to_string(n + 1) + "}";
-      text.replace(at, token.size(), name);
-      at += name.size();
+  // The output with each token of the store written as its name: {token}, {token2}, ...
+  std::string MaskTokens(const std::string& text) {
+    static const std::regex issued("SIMTOKEN-[0-9]+-[0-9]+");
+    std::string masked;
+    size_t from = 0;
+    for (std::sregex_iterator it(text.begin(), text.end(), issued), end; it != end; ++it) {
+      size_t n = std::find(m_Issued.begin(), m_Issued.end(), it->str()) - m_Issued.begin();
+      if (n == m_Issued.size()) m_Issued.push_back(it->str());
+      masked += text.substr(from, it->position() - from);
+      masked += n == 0 ? "{token}" : "{token" + std::to_string(n + 1) + "}";
+      from = it->position() + it->length();
     }
-    return text;
+    return masked + text.substr(from);
   }
 
   std::string Expand(const std::string& command) const {
