@@ -15,13 +15,16 @@
 //   store revoke TOKEN         the store forgets the device's token
 //   store clock SECONDS        the store's clock moves on (back when negative): rentals expire
 //   store wishlist N           titles 1001 to 1000+N are added to the account's wishlist in order
+//   store prepaid CENTS        the account's prepaid balance
 //   flag TITLE [0|1]           the title's wishlist flag in the handle's cache: printed, or written
 //   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
 //   cache-write NAME KEY TEXT  writes TEXT there
 // Words are separated by spaces; '...' makes one word of what it quotes. In commands, {token} is
 // the token of the simulator's account of PIN 1234 (authorised when the session starts), {dir}
-// the session's own folder and {cache} "--cache-type 2 --cache-path {dir}cache". Tokens the store
-// issues during the session print as {token2}, {token3}, ... in the order they first show.
+// the session's own folder and {cache} "--cache-type 2 --cache-path {dir}cache". Values the store
+// numbers as it goes print as names, in the order they first show, so that a session reads the
+// same in any process, and commands may use the names: tokens {token2}, {token3}, ..., passes
+// {pass}, {pass2}, ... and transactions {transaction}, ...
 //
 // What a command printed: an operation's result as vlws writes it, and when the call failed, first
 // "status NAME (number): meaning" and then the record as the call left it (a text it left null
@@ -31,6 +34,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <map>
 #include <regex>
 #include <set>
 #include <sstream>
@@ -89,7 +93,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     int account = 0;
     ASSERT_EQ(0, m_Sim.Store().Authorize(kPin, "00-11-22-33-44-55", 7, &m_Token, &account));
     m_LoadTime = m_Sim.Store().LastCacheLoadTime();
-    m_Issued = {m_Token};
+    m_Numbered["token"] = {m_Token};
   }
   void TearDown() override {
     m_Sim.Store().SetLastCacheLoadTime(m_LoadTime);
@@ -108,7 +112,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
         std::string printed = Command(Words(Expand(line.substr(2))));
         for (const std::string& logged : TakeLog()) printed += "| " + logged + "\n";
         printed += VLReceivedLines(m_Sim) + VLCacheChanges(m_Dir / "cache", &kept);
-        transcript += line + "\n" + Replaced(MaskTokens(printed), m_Dir.path(), "{dir}");
+        transcript += line + "\n" + Replaced(Named(printed), m_Dir.path(), "{dir}");
       } else if (line.empty() || line[0] == '#') {
         transcript += line + "\n";
       }
@@ -116,24 +120,42 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     return transcript;
   }
 
-  // The output with each token of the store written as its name: {token}, {token2}, ...
-  std::string MaskTokens(const std::string& text) {
-    static const std::regex issued("SIMTOKEN-[0-9]+-[0-9]+");
-    std::string masked;
-    size_t from = 0;
-    for (std::sregex_iterator it(text.begin(), text.end(), issued), end; it != end; ++it) {
-      size_t n = std::find(m_Issued.begin(), m_Issued.end(), it->str()) - m_Issued.begin();
-      if (n == m_Issued.size()) m_Issued.push_back(it->str());
-      masked += text.substr(from, it->position() - from);
-      masked += n == 0 ? "{token}" : "{token" + std::to_string(n + 1) + "}";
-      from = it->position() + it->length();
+  static std::string Name(const std::string& kind, size_t n) {
+    return "{" + kind + (n == 0 ? "" : std::to_string(n + 1)) + "}";
+  }
+
+  // The output with each numbered value (the whole match of its pattern, or the first group)
+  // written as its name.
+  std::string Named(std::string text) {
+    static const std::pair<const char*, std::regex> kKinds[] = {
+        {"token", std::regex("SIMTOKEN-[0-9]+-[0-9]+")},
+        {"pass", std::regex("\"PassID\": ([1-9][0-9]*)")},
+        {"transaction", std::regex("(?:\"TransactionId\": |AUTH)([1-9][0-9]*)")}};
+    for (const auto& kind : kKinds) {
+      std::vector<std::string>& values = m_Numbered[kind.first];
+      std::string named;
+      size_t from = 0;
+      for (std::sregex_iterator it(text.begin(), text.end(), kind.second), end; it != end; ++it) {
+        const size_t group = it->size() - 1;
+        size_t n = std::find(values.begin(), values.end(), it->str(group)) - values.begin();
+        if (n == values.size()) values.push_back(it->str(group));
+        named += text.substr(from, it->position(group) - from) + Name(kind.first, n);
+        from = it->position(group) + it->length(group);
+      }
+      text = named + text.substr(from);
     }
-    return masked + text.substr(from);
+    return text;
   }
 
   std::string Expand(const std::string& command) const {
     std::string cache = "--cache-type 2 --cache-path " + m_Dir / "cache";
-    return Replaced(Replaced(Replaced(command, "{cache}", cache), "{dir}", m_Dir.path()), "{token}", m_Token);
+    std::string expanded = Replaced(Replaced(command, "{cache}", cache), "{dir}", m_Dir.path());
+    for (const auto& kind : m_Numbered) {
+      for (size_t n = 0; n < kind.second.size(); ++n) {
+        expanded = Replaced(expanded, Name(kind.first, n), kind.second[n]);
+      }
+    }
+    return expanded;
   }
 
   // Runs a command; what it printed.
@@ -209,6 +231,8 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       m_Sim.Store().AdvanceClock(std::stol(value));
     } else if (what == "wishlist") {
       for (int title = 1001; title <= 1000 + std::stoi(value); ++title) m_Sim.Store().WishlistAdd(Account(), title);
+    } else if (what == "prepaid") {
+      m_Sim.Store().SetPrepaidCents(Account(), std::stoi(value));
     } else {
       return "usage: unknown store setting " + what + "\n";
     }
@@ -234,7 +258,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
 
   VLTestDir m_Dir;
   std::string m_Token;
-  std::vector<std::string> m_Issued;  // the store's tokens in the order they showed, m_Token first
+  std::map<std::string, std::vector<std::string>> m_Numbered;  // values by kind, in the order they showed
   std::string m_LoadTime;
 };
 
