@@ -12,6 +12,10 @@
 //   store load-time TEXT       the catalogue's load time the store answers
 //   store device-env DIGIT     the environment the device-environment service answers
 //   store access-type N        the access type the store answers
+//   store revoke TOKEN         the store forgets the device's token
+//   store clock SECONDS        the store's clock moves on (back when negative): rentals expire
+//   store wishlist N           titles 1001 to 1000+N are added to the account's wishlist in order
+//   store prepaid CENTS        the account's prepaid balance
 //   flag TITLE [0|1]           the title's wishlist flag in the handle's cache: printed, or written
 //   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
 //   cache-write NAME KEY TEXT  writes TEXT there
@@ -25,8 +29,11 @@
 // Words are separated by spaces; '...' makes one word of what it quotes. In commands, {token} is
 // the token of the simulator's account of PIN 1234 (authorised when the session starts), {dir}
 // the session's own folder, which is the current folder, and {cache} "--cache-type 2
-// --cache-path {dir}cache". In what commands print, these values are written as those names, and
-// the first device identifier the session made as {id}.
+// --cache-path {dir}cache". Values the store numbers as it goes print as names, in the order they
+// first show, so that a session reads the same in any process, and commands may use the names:
+// tokens {token2}, {token3}, ..., passes {pass}, {pass2}, ... and transactions {transaction}, ...
+// In what commands print, {token} and {dir} are written as those names too, and the first device
+// identifier the session made as {id}.
 //
 // What a command printed: an operation's result as vlws writes it, and when the call failed, first
 // "status NAME (number): meaning" and then the record as the call left it (a text it left null
@@ -38,6 +45,7 @@
 
 #include <algorithm>
 #include <memory>
+#include <map>
 #include <regex>
 #include <set>
 #include <sstream>
@@ -103,6 +111,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     VL_LogRegisterArea("VL_WSCFGAE", &area);
     VL_LogActivateArea(area, 1);
     VL_LogSetObserver(Observe, this);
+    m_Numbered["token"] = {m_Token};
   }
   void TearDown() override {
     m_Movie.reset();
@@ -134,19 +143,52 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     return transcript;
   }
 
-  // The output with the token, the folder and the first device identifier the session made
-  // written as {token}, {dir} and {id}.
+  // The output with the numbered values written as their names, the folder as {dir} and the first
+  // device identifier the session made as {id}.
   std::string Masked(const std::string& printed) {
     static const std::regex id("[0-9A-F]{2}(-[0-9A-F]{2}){5}");
     std::smatch made;
     if (m_Id.empty() && std::regex_search(printed, made, id) && made.str() != "00-11-22-33-44-55") m_Id = made.str();
-    std::string text = Replaced(Replaced(printed, m_Token, "{token}"), m_Dir.path(), "{dir}");
+    std::string text = Replaced(Named(printed), m_Dir.path(), "{dir}");
     return m_Id.empty() ? text : Replaced(text, m_Id, "{id}");
+  }
+
+  static std::string Name(const std::string& kind, size_t n) {
+    return "{" + kind + (n == 0 ? "" : std::to_string(n + 1)) + "}";
+  }
+
+  // The output with each numbered value (the whole match of its pattern, or the first group)
+  // written as its name.
+  std::string Named(std::string text) {
+    static const std::pair<const char*, std::regex> kKinds[] = {
+        {"token", std::regex("SIMTOKEN-[0-9]+-[0-9]+")},
+        {"pass", std::regex("\"PassID\": ([1-9][0-9]*)")},
+        {"transaction", std::regex("(?:\"TransactionId\": |AUTH)([1-9][0-9]*)")}};
+    for (const auto& kind : kKinds) {
+      std::vector<std::string>& values = m_Numbered[kind.first];
+      std::string named;
+      size_t from = 0;
+      for (std::sregex_iterator it(text.begin(), text.end(), kind.second), end; it != end; ++it) {
+        const size_t group = it->size() - 1;
+        size_t n = std::find(values.begin(), values.end(), it->str(group)) - values.begin();
+        if (n == values.size()) values.push_back(it->str(group));
+        named += text.substr(from, it->position(group) - from) + Name(kind.first, n);
+        from = it->position(group) + it->length(group);
+      }
+      text = named + text.substr(from);
+    }
+    return text;
   }
 
   std::string Expand(const std::string& command) const {
     std::string cache = "--cache-type 2 --cache-path " + m_Dir / "cache";
-    return Replaced(Replaced(Replaced(command, "{cache}", cache), "{dir}", m_Dir.path()), "{token}", m_Token);
+    std::string expanded = Replaced(Replaced(command, "{cache}", cache), "{dir}", m_Dir.path());
+    for (const auto& kind : m_Numbered) {
+      for (size_t n = 0; n < kind.second.size(); ++n) {
+        expanded = Replaced(expanded, Name(kind.first, n), kind.second[n]);
+      }
+    }
+    return expanded;
   }
 
   // Runs a command; what it printed.
@@ -240,6 +282,14 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       m_Sim.Store().SetDeviceEnv("00-11-22-33-44-55", std::stoi(value));
     } else if (what == "access-type") {
       m_Sim.Store().SetAccessType(std::stoi(value));
+    } else if (what == "revoke") {
+      m_Sim.Store().Deactivate(value, "00-11-22-33-44-55");
+    } else if (what == "clock") {
+      m_Sim.Store().AdvanceClock(std::stol(value));
+    } else if (what == "wishlist") {
+      for (int title = 1001; title <= 1000 + std::stoi(value); ++title) m_Sim.Store().WishlistAdd(Account(), title);
+    } else if (what == "prepaid") {
+      m_Sim.Store().SetPrepaidCents(Account(), std::stoi(value));
     } else {
       return "usage: unknown store setting " + what + "\n";
     }
@@ -289,6 +339,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
   std::vector<std::string> m_Variables;
   std::string m_Token;
   std::string m_Id;
+  std::map<std::string, std::vector<std::string>> m_Numbered;  // values by kind, in the order they showed
   std::string m_LoadTime;
 };
 
