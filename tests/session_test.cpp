@@ -12,6 +12,10 @@
 //   store load-time TEXT       the catalogue's load time the store answers
 //   store device-env DIGIT     the environment the device-environment service answers
 //   store access-type N        the access type the store answers
+//   store now SECONDS          the store's clock, seconds since 1970 UTC
+//   hosts                      from now on each SOAP request also shows where it went and its
+//                              User-Agent ("@ host/path agent")
+//   file PATH TEXT             writes TEXT (and nothing else) into the file PATH
 //   flag TITLE [0|1]           the title's wishlist flag in the handle's cache: printed, or written
 //   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
 //   cache-write NAME KEY TEXT  writes TEXT there
@@ -22,7 +26,7 @@
 // What a command printed: an operation's result as vlws writes it, and when the call failed, first
 // "status NAME (number): meaning" and then the record as the call left it (a text it left null
 // shows as null); then the lines the library logged ("| "), the requests the store received
-// ("> ") and the rows the file cache in {dir}cache gained ("+ ") or lost ("- ").
+// ("> ", "@ ") and the rows the file cache in {dir}cache gained ("+ ") or lost ("- ").
 #include <dirent.h>
 #include <gtest/gtest.h>
 
@@ -89,6 +93,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     m_Sim.Store().SetLastCacheLoadTime(m_LoadTime);
     m_Sim.Store().SetDeviceEnv("00-11-22-33-44-55", 2);
     m_Sim.Store().SetAccessType(STREAM);
+    m_Sim.Store().SetNow(time(nullptr));
     VLTestAccountClient::TearDown();
   }
 
@@ -101,6 +106,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       if (line.compare(0, 2, "$ ") == 0) {
         std::string printed = Command(Words(Expand(line.substr(2))));
         for (const std::string& logged : TakeLog()) printed += "| " + logged + "\n";
+        if (m_Hosts) printed += Hosts();
         printed += VLReceivedLines(m_Sim) + VLCacheChanges(m_Dir / "cache", &kept);
         transcript += line + "\n" + Replaced(Replaced(printed, m_Token, "{token}"), m_Dir.path(), "{dir}");
       } else if (line.empty() || line[0] == '#') {
@@ -108,6 +114,15 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       }
     }
     return transcript;
+  }
+
+  // Where the SOAP requests the store received went, and with which User-Agent.
+  std::string Hosts() {
+    std::string lines;
+    for (const VLSimRequest& r : VLRequestsByConnection(m_Sim)) {
+      if (!r.service.empty()) lines += "@ " + r.host + r.path + " " + r.userAgent + "\n";
+    }
+    return lines;
   }
 
   std::string Expand(const std::string& command) const {
@@ -130,6 +145,11 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       return m_Sim.AddFault(rest[0], &error) ? "" : "usage: " + error + "\n";
     }
     if (name == "store" && rest.size() == 2) return Store(rest[0], rest[1]);
+    if (name == "hosts" && rest.empty()) {
+      m_Hosts = true;
+      return "";
+    }
+    if (name == "file" && rest.size() == 2) return VLWriteFile(rest[0], rest[1]) ? "" : "not written\n";
     if (name == "flag" || name == "cached" || name == "cache-write") {
       return m_Handle.client && m_Handle.client->m_Cache ? CacheCommand(name, rest) : "no cache\n";
     }
@@ -182,6 +202,8 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       m_Sim.Store().SetDeviceEnv("00-11-22-33-44-55", std::stoi(value));
     } else if (what == "access-type") {
       m_Sim.Store().SetAccessType(std::stoi(value));
+    } else if (what == "now") {
+      m_Sim.Store().SetNow(std::stol(value));
     } else {
       return "usage: unknown store setting " + what + "\n";
     }
@@ -208,6 +230,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
   VLTestDir m_Dir;
   std::string m_Token;
   std::string m_LoadTime;
+  bool m_Hosts = false;
 };
 
 TEST_P(Session, PrintsItsTranscript) {
