@@ -15,10 +15,10 @@
 //   store now SECONDS          the store's clock, seconds since 1970 UTC
 //   hosts                      from now on each SOAP request also shows where it went and its
 //                              User-Agent ("@ host/path agent")
-//   file PATH TEXT             writes TEXT (and nothing else) into the file PATH
 //   flag TITLE [0|1]           the title's wishlist flag in the handle's cache: printed, or written
 //   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
 //   cache-write NAME KEY TEXT  writes TEXT there
+//   write-file PATH TEXT       writes a file
 // Words are separated by spaces; '...' makes one word of what it quotes. In commands, {token} is
 // the token of the simulator's account of PIN 1234 (authorised when the session starts), {dir}
 // the session's own folder and {cache} "--cache-type 2 --cache-path {dir}cache".
@@ -149,7 +149,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       m_Hosts = true;
       return "";
     }
-    if (name == "file" && rest.size() == 2) return VLWriteFile(rest[0], rest[1]) ? "" : "not written\n";
+    if (name == "write-file" && rest.size() == 2) return VLWriteFile(rest[0], rest[1]) ? "" : "not written\n";
     if (name == "flag" || name == "cached" || name == "cache-write") {
       return m_Handle.client && m_Handle.client->m_Cache ? CacheCommand(name, rest) : "no cache\n";
     }
