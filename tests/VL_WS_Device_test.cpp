@@ -171,8 +171,9 @@ TEST_F(Device, LocalAddressIsTheLocalEndOfAConnectionToTheService) {
   VL_WS_release(&address);
 }
 
-// The server time's own answers are in the device-server-time session.
-TEST_F(Device, NullArgumentsAndAUserAgentRecordAHandleWithoutClientStateLeavesUntouched) {
+// Null arguments, and a handle without client state, which leaves the record untouched (the
+// server time's answers are in the device-server-time session).
+TEST_F(Device, NullArgumentsAndAHandleWithoutClientState) {
   Init();
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getServerTime(nullptr));
   VL_WS_Handle none = {};
