@@ -1,9 +1,7 @@
 // The device and network operations against real sockets: the bandwidth probe against canned
 // answers of a loopback server, and the operations against the store simulator: the bandwidth
-// probe of the store's configuration, the server time, the local address, the User-Agent and the
-// device identifier.
+// probe of the store's configuration, the local address, the User-Agent and the device identifier.
 #include <gtest/gtest.h>
-#include <time.h>
 
 #include <regex>
 #include <string>
@@ -27,10 +25,6 @@ testing::Environment* const s_Simulator = testing::AddGlobalTestEnvironment(new 
 
 class Device : public VLSimClientTest {
  protected:
-  void TearDown() override {
-    m_Sim.Store().SetNow(time(nullptr));
-    VLSimClientTest::TearDown();
-  }
   void Init() {
     VL_WS_SetupParams params = VLTestSetupParams();
     ASSERT_EQ(VL_WS_OK, VL_WS_initialize(&m_Handle, &params));
@@ -157,24 +151,6 @@ TEST_F(Bandwidth, AConfigurationWithoutProbeOrNoConfigurationAtAll) {
   EXPECT_STREQ("", m_Handle.client->m_Params.BandwithCheckURL.c_str());
 }
 
-// A time of the store's clock, as seconds since 1970 UTC: 2010-12-31 11:59:59 PM.
-const time_t k20101231_235959 = 1293839999;
-
-TEST_F(Device, ServerTimeReadsTheStoresTwelveHourClock) {
-  // 11:59:59 PM, 2011-01-01 12:05:00 AM, 2011-06-15 12:30:00 PM and 1:02:03 AM
-  for (time_t now : {k20101231_235959, time_t{1293840300}, time_t{1308141000}, time_t{1308099723}}) {
-    m_Sim.Store().SetNow(now);
-    time_t got = 0;
-    EXPECT_EQ(VL_WS_OK, VL_WS_getServerTime(&got));
-    EXPECT_EQ(now, got);
-  }
-  std::vector<VLSimRequest> requests = Requests(4);
-  ASSERT_EQ(4u, requests.size());
-  EXPECT_EQ("store.ostrel.example", requests[0].host);
-  EXPECT_EQ("/device/time/", requests[0].path);
-  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getServerTime(nullptr));
-}
-
 TEST_F(Device, LocalAddressIsTheLocalEndOfAConnectionToTheService) {
   Init();
   VL_WS_String address;
@@ -195,8 +171,11 @@ TEST_F(Device, LocalAddressIsTheLocalEndOfAConnectionToTheService) {
   VL_WS_release(&address);
 }
 
-TEST_F(Device, UserAgentOfAHandleWithoutClientStateLeavesTheRecordUntouched) {
+// Null arguments, and a handle without client state, which leaves the record untouched (the
+// server time's answers are in the device-server-time session).
+TEST_F(Device, NullArgumentsAndAHandleWithoutClientState) {
   Init();
+  EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getServerTime(nullptr));
   VL_WS_Handle none = {};
   VL_WS_String untouched = {};
   EXPECT_EQ(VL_WS_E_INVALID_ARGUMENT, VL_WS_getUserAgent(&none, &untouched));

@@ -16,6 +16,9 @@
 //   store clock SECONDS        the store's clock moves on (back when negative): rentals expire
 //   store wishlist N           titles 1001 to 1000+N are added to the account's wishlist in order
 //   store prepaid CENTS        the account's prepaid balance
+//   store now SECONDS          the store's clock, seconds since 1970 UTC
+//   hosts                      from now on each SOAP request also shows where it went and its
+//                              User-Agent ("@ host/path agent")
 //   flag TITLE [0|1]           the title's wishlist flag in the handle's cache: printed, or written
 //   cached NAME KEY            whether the handle's cache keeps an answer under Name and Key
 //   cache-write NAME KEY TEXT  writes TEXT there
@@ -39,7 +42,7 @@
 // "status NAME (number): meaning" and then the record as the call left it (a text it left null
 // shows as null); then the lines the library logged ("| ", the settings class's with their level
 // first, and none that trace entering or leaving a function), the requests the store received
-// ("> ") and the rows the file cache in {dir}cache gained ("+ ") or lost ("- ").
+// ("> ", "@ ") and the rows the file cache in {dir}cache gained ("+ ") or lost ("- ").
 #include <gtest/gtest.h>
 #include <stdlib.h>
 
@@ -119,6 +122,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     m_Sim.Store().SetLastCacheLoadTime(m_LoadTime);
     m_Sim.Store().SetDeviceEnv("00-11-22-33-44-55", 2);
     m_Sim.Store().SetAccessType(STREAM);
+    m_Sim.Store().SetNow(time(nullptr));
     VLTestAccountClient::TearDown();
   }
 
@@ -134,6 +138,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
         std::string printed = command.compare(0, 3, "js ") == 0 ? Js(command.substr(3)) : Command(Words(command));
         for (const std::string& logged : m_Lines) printed += "| " + logged + "\n";
         m_Lines.clear();
+        if (m_Hosts) printed += Hosts();
         printed += VLReceivedLines(m_Sim) + VLCacheChanges(m_Dir / "cache", &kept);
         transcript += line + "\n" + Masked(printed);
       } else if (line.empty() || line[0] == '#') {
@@ -180,6 +185,15 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     return text;
   }
 
+  // Where the SOAP requests the store received went, and with which User-Agent.
+  std::string Hosts() {
+    std::string lines;
+    for (const VLSimRequest& r : VLRequestsByConnection(m_Sim)) {
+      if (!r.service.empty()) lines += "@ " + r.host + r.path + " " + r.userAgent + "\n";
+    }
+    return lines;
+  }
+
   std::string Expand(const std::string& command) const {
     std::string cache = "--cache-type 2 --cache-path " + m_Dir / "cache";
     std::string expanded = Replaced(Replaced(command, "{cache}", cache), "{dir}", m_Dir.path());
@@ -206,6 +220,10 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       return m_Sim.AddFault(rest[0], &error) ? "" : "usage: " + error + "\n";
     }
     if (name == "store" && rest.size() == 2) return Store(rest[0], rest[1]);
+    if (name == "hosts" && rest.empty()) {
+      m_Hosts = true;
+      return "";
+    }
     if (name == "setenv" && rest.size() == 1) return unsetenv(rest[0].c_str()) == 0 ? "" : "not unset\n";
     if (name == "setenv" && rest.size() == 2) {
       m_Variables.push_back(rest[0]);
@@ -290,6 +308,8 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       for (int title = 1001; title <= 1000 + std::stoi(value); ++title) m_Sim.Store().WishlistAdd(Account(), title);
     } else if (what == "prepaid") {
       m_Sim.Store().SetPrepaidCents(Account(), std::stoi(value));
+    } else if (what == "now") {
+      m_Sim.Store().SetNow(std::stol(value));
     } else {
       return "usage: unknown store setting " + what + "\n";
     }
@@ -341,6 +361,7 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
   std::string m_Id;
   std::map<std::string, std::vector<std::string>> m_Numbered;  // values by kind, in the order they showed
   std::string m_LoadTime;
+  bool m_Hosts = false;
 };
 
 TEST_P(Session, PrintsItsTranscript) {

@@ -11,6 +11,9 @@
 std::string VLReceivedLines(VLSimServer& sim) {
   std::string lines;
   for (const VLSimRequest& r : VLRequestsByConnection(sim)) {
+    // A connection that failed before its request (a refused certificate) may be logged after
+    // the client has moved on: it has no line, and the client's status tells the failure.
+    if (r.method.empty()) continue;
     lines += "> " + (r.service.empty() ? r.method + " " + r.host + r.path : r.service + " " + r.operation);
     lines += (r.hasAuthToken ? " token=" + r.authToken : "") + "\n";
   }

@@ -10,7 +10,8 @@
 
 // What the store received since the last call, a line per request in the order the client
 // connected: "> " and the service and operation (and " token=" and the token sent, if the request
-// had the element), or the method, host and path of a plain HTTP request. The log is emptied.
+// had the element), or the method, host and path of a plain HTTP request; a connection that sent
+// no request has none. The log is emptied.
 std::string VLReceivedLines(VLSimServer& sim);
 
 // The rows of the file caches in folder that came ("+ ") or went ("- ") since the rows in kept,
