@@ -235,6 +235,7 @@ const StatusText kStatuses[] = {
     {VLWS_STATUS(VL_WS_E_HTTP_NOT_MODIFIED), "the image server answered \"304 Not Modified\""},
     {VLWS_STATUS(VL_WS_E_SETTING_MISSING), "the settings file is empty or has no setting with the key"},
     {VLWS_STATUS(VL_WS_E_SETTING_DAMAGED), "the encrypted value is damaged"},
+    {VLWS_STATUS(VL_WS_E_SETTING_UNREADABLE), "the file does not parse as a settings file"},
     {VLWS_STATUS(VL_WS_E_CACHE_OPEN), "the cache database could not be opened"},
     {VLWS_STATUS(VL_WS_E_CACHE_FOLDER), "the cache folder does not exist and cannot be created"},
     {VLWS_STATUS(VL_WS_E_BANDWIDTH_NO_URL), "the store's configuration names no bandwidth probe"},
