@@ -6,7 +6,6 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <sstream>
 #include <string>
 #include <thread>
@@ -150,26 +149,15 @@ class CacheScript : public testing::TestWithParam<std::string> {
   }
 };
 
-std::vector<std::string> CacheScripts() {
-  std::vector<std::string> names;
-  for (const std::string& file : VLFolderFiles(VL_SOURCE_DIR "/tests/data/cache")) names.push_back(file);
-  std::sort(names.begin(), names.end());
-  return names;
-}
-
 TEST_P(CacheScript, PrintsItsTranscriptInMemoryAndInAFile) {
-  const std::string file = VL_SOURCE_DIR "/tests/data/cache/" + GetParam();
+  const std::string file = VL_SOURCE_DIR "/tests/data/cache/" + GetParam() + ".txt";
   const std::string memory = Run(kMemory, file);
   EXPECT_EQ(memory, Run(kFile, file));
-  VLExpectTranscript("cache/" + GetParam(), memory);
+  VLExpectTranscript("cache/" + GetParam() + ".txt", memory);
 }
 
-INSTANTIATE_TEST_SUITE_P(, CacheScript, testing::ValuesIn(CacheScripts()),
-                         [](const testing::TestParamInfo<std::string>& info) {
-                           std::string name = info.param.substr(0, info.param.find('.'));
-                           std::replace(name.begin(), name.end(), '-', '_');
-                           return name;
-                         });
+INSTANTIATE_TEST_SUITE_P(, CacheScript, testing::ValuesIn(VLTranscriptsIn(VL_SOURCE_DIR "/tests/data/cache")),
+                         VLTranscriptTestName);
 
 // Bytes of every value, zeros included, come back as they went in.
 TEST(CacheKinds, MetadataKeepsItsExactBytes) {

@@ -66,16 +66,6 @@ namespace {
 
 const char kSessions[] = VL_SOURCE_DIR "/tests/data/sessions/";
 
-// The names of the session files, without ".txt".
-std::vector<std::string> SessionNames() {
-  std::vector<std::string> names;
-  for (const std::string& file : VLFolderFiles(kSessions)) {
-    if (file.size() > 4 && file.compare(file.size() - 4, 4, ".txt") == 0) names.push_back(file.substr(0, file.size() - 4));
-  }
-  std::sort(names.begin(), names.end());
-  return names;
-}
-
 // The words of a command: separated by spaces, '...' quoting one word.
 std::vector<std::string> Words(const std::string& command) {
   std::vector<std::string> words;
@@ -108,13 +98,14 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
   void SetUp() override {
     VLTestAccountClient::SetUp();
     int account = 0;
-    ASSERT_EQ(0, m_Sim.Store().Authorize(kPin, "00-11-22-33-44-55", 7, &m_Token, &account));
+    std::string token;
+    ASSERT_EQ(0, m_Sim.Store().Authorize(kPin, "00-11-22-33-44-55", 7, &token, &account));
     m_LoadTime = m_Sim.Store().LastCacheLoadTime();
     int area = -1;
     VL_LogRegisterArea("VL_WSCFGAE", &area);
     VL_LogActivateArea(area, 1);
     VL_LogSetObserver(Observe, this);
-    m_Numbered["token"] = {m_Token};
+    m_Numbered["token"] = {token};
   }
   void TearDown() override {
     m_Movie.reset();
@@ -264,27 +255,28 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
     // Later words win, so the command's own override the simulator's.
     vlws::Operation setup = {"init", "VL_WS_initialize", "", {}, true, nullptr};
     vlws::Args args;
-    std::string error;
-    std::vector<char*> argv;
-    for (std::string& word : words) argv.push_back(&word[0]);
-    if (vlws::ParseArgs(setup, static_cast<int>(argv.size()), argv.data(), &args, &error) != vlws::Parsed::kRun) {
-      return "usage: " + error + "\n";
-    }
+    std::string error = Parse(setup, words, &args);
+    if (!error.empty()) return error;
     VL_WS_release(&m_Handle);
     VL_WS_SetupParams params = vlws::SetupParams(args);
     VL_WS_Status status = VL_WS_initialize(&m_Handle, &params);
     return status == VL_WS_OK ? "" : "status " + vlws::DescribeStatus(status, setup.function) + "\n";
   }
 
-  std::string Operation(vlws::Operation op, std::vector<std::string> words) {
-    op.handle = false;  // the session's handle: the operation's own options only
-    vlws::Args args;
-    std::string error;
+  // The options of op in words, as vlws reads them; "usage: ..." when they are wrong.
+  static std::string Parse(const vlws::Operation& op, std::vector<std::string> words, vlws::Args* args) {
     std::vector<char*> argv;
     for (std::string& word : words) argv.push_back(&word[0]);
-    if (vlws::ParseArgs(op, static_cast<int>(argv.size()), argv.data(), &args, &error) != vlws::Parsed::kRun) {
-      return "usage: " + error + "\n";
-    }
+    std::string error;
+    if (vlws::ParseArgs(op, static_cast<int>(argv.size()), argv.data(), args, &error) == vlws::Parsed::kRun) return "";
+    return "usage: " + error + "\n";
+  }
+
+  std::string Operation(vlws::Operation op, const std::vector<std::string>& words) {
+    op.handle = false;  // the session's handle: the operation's own options only
+    vlws::Args args;
+    std::string error = Parse(op, words, &args);
+    if (!error.empty()) return error;
     VLJsonWriter json;
     std::string detail;
     VL_WS_Status status = op.run(args, &m_Handle, &json, &detail);
@@ -357,7 +349,6 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
   std::unique_ptr<VLTestMovie> m_Movie;
   std::vector<std::string> m_Lines;
   std::vector<std::string> m_Variables;
-  std::string m_Token;
   std::string m_Id;
   std::map<std::string, std::vector<std::string>> m_Numbered;  // values by kind, in the order they showed
   std::string m_LoadTime;
@@ -368,11 +359,6 @@ TEST_P(Session, PrintsItsTranscript) {
   VLExpectTranscript("sessions/" + GetParam() + ".txt", Transcript(kSessions + GetParam() + ".txt"));
 }
 
-INSTANTIATE_TEST_SUITE_P(, Session, testing::ValuesIn(SessionNames()),
-                         [](const testing::TestParamInfo<std::string>& info) {
-                           std::string name = info.param;
-                           std::replace(name.begin(), name.end(), '-', '_');
-                           return name;
-                         });
+INSTANTIATE_TEST_SUITE_P(, Session, testing::ValuesIn(VLTranscriptsIn(kSessions)), VLTranscriptTestName);
 
 }  // namespace

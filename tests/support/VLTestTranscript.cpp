@@ -40,6 +40,20 @@ std::string VLCacheChanges(const std::string& folder, std::set<std::string>* kep
   return lines;
 }
 
+std::vector<std::string> VLTranscriptsIn(const std::string& folder) {
+  std::vector<std::string> names;
+  for (const std::string& file : VLFolderFiles(folder)) {
+    if (file.size() > 4 && file.compare(file.size() - 4, 4, ".txt") == 0) names.push_back(file.substr(0, file.size() - 4));
+  }
+  return names;  // a set's order
+}
+
+std::string VLTranscriptTestName(const testing::TestParamInfo<std::string>& info) {
+  std::string name = info.param;
+  for (char& c : name) c = c == '-' ? '_' : c;
+  return name;
+}
+
 void VLExpectTranscript(const std::string& expectedFile, const std::string& transcript) {
   const std::string expectedPath = VL_SOURCE_DIR "/tests/data/" + expectedFile;
   if (transcript == VLReadFile(expectedPath)) return;

@@ -3,8 +3,11 @@
 #ifndef VLTESTTRANSCRIPT_H
 #define VLTESTTRANSCRIPT_H
 
+#include <gtest/gtest.h>
+
 #include <set>
 #include <string>
+#include <vector>
 
 #include "VLSimServer.h"
 
@@ -18,6 +21,11 @@ std::string VLReceivedLines(VLSimServer& sim);
 // which become the rows now: each database file's name, and its service answers and user data by
 // Name and Key and box art by prefix and size.
 std::string VLCacheChanges(const std::string& folder, std::set<std::string>* kept);
+
+// The transcripts of a folder: the names of its ".txt" files without the ending, sorted; and a
+// test name made of one (a '-' becomes '_'), for tests that take one transcript each.
+std::vector<std::string> VLTranscriptsIn(const std::string& folder);
+std::string VLTranscriptTestName(const testing::TestParamInfo<std::string>& info);
 
 // Adds a failure unless transcript is the content of expectedFile (a path below tests/data). The
 // failure writes the transcript under the same name below the build's tests folder and gives the
