@@ -1,6 +1,7 @@
 // CfgXMLFile: settings files on disk, encrypted values and their packed form, the file format
 // pinned by a file written by an earlier build, and whole-file replacement under SIGKILL and a
-// full disk.
+// full disk. (What plain settings files hold, and how their reads and writes answer, the session
+// settings-xml shows.)
 #include <gtest/gtest.h>
 
 #include <signal.h>
@@ -46,65 +47,6 @@ CfgXMLFile::Result WriteSetting(const std::string& path, const char* key, const 
     EXPECT_EQ(CfgXMLFile::code, got.result) << key;       \
     EXPECT_EQ(std::string(text), got.value) << key;       \
   } while (0)
-
-TEST(CfgXMLFile, WritesKeepOrderAndReplaceInPlace) {
-  VLTestDir dir;
-  std::string path = dir / "settings.xml";
-  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(path, "A", "first"));
-  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(path, "B", "second <&> \"quoted\""));
-  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(path, "A", "Gr\xC3\xBC\xC3\x9F" "e"));
-  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(path, "a", ""));  // keys are case-sensitive
-
-  std::string text = VLReadFile(path);
-  EXPECT_EQ(0u, text.find("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<DUDUVud xmlns:SOAP-ENV="));
-  size_t a = text.find("\t<VL1:Configuration Key=\"A\">\n\t\t<VL1:Value>");
-  size_t b = text.find("<VL1:Configuration Key=\"B\">");
-  size_t lower = text.find("<VL1:Configuration Key=\"a\">");
-  ASSERT_NE(std::string::npos, a) << text;
-  EXPECT_LT(a, b);
-  EXPECT_LT(b, lower);
-  EXPECT_NE(std::string::npos, text.find("second &lt;&amp;&gt;")) << text;
-  EXPECT_EQ(text.find("Key=\"A\""), text.rfind("Key=\"A\""));  // one setting A
-  EXPECT_EQ(std::string::npos, text.find("first"));
-
-  EXPECT_READ(path, "A", false, CFG_OK, "Gr\xC3\xBC\xC3\x9F" "e");
-  EXPECT_READ(path, "B", false, CFG_OK, "second <&> \"quoted\"");
-  EXPECT_READ(path, "a", false, CFG_OK, "");
-  EXPECT_READ(path, "C", false, CFG_NOT_FOUND, "");
-  EXPECT_READ(path, "", false, CFG_EMPTY_KEY, "");
-  EXPECT_EQ(CfgXMLFile::CFG_EMPTY_KEY, WriteSetting(path, "", "x"));
-  // Nothing but the file itself is left in the folder.
-  EXPECT_EQ(std::set<std::string>{"settings.xml"}, VLFolderFiles(dir.path()));
-
-  // Files that hold no setting.
-  EXPECT_READ(dir / "missing.xml", "A", false, CFG_FILE_ERROR, "");
-  EXPECT_READ(dir.path(), "A", false, CFG_FILE_ERROR, "");  // a folder
-  ASSERT_TRUE(VLWriteFile(dir / "empty.xml", ""));
-  EXPECT_READ(dir / "empty.xml", "A", false, CFG_NOT_FOUND, "");
-
-  // A file of settings written by hand: a setting without a key never matches but is kept, only
-  // the first of two settings with one key counts, and a setting without a value reads empty.
-  ASSERT_TRUE(VLWriteFile(
-      dir / "hand.xml",
-      "<DUDUVud xmlns:VL1=\"http://store.ostrel.example/api/\">"
-      "<VL1:Configuration><VL1:Value>orphan</VL1:Value></VL1:Configuration>"
-      "<VL1:Configuration Key=\"K\"><VL1:Value>one</VL1:Value></VL1:Configuration>"
-      "<VL1:Configuration Key=\"K\"><VL1:Value>two</VL1:Value></VL1:Configuration>"
-      "<VL1:Configuration Key=\"N\"/></DUDUVud>"));
-  EXPECT_READ(dir / "hand.xml", "K", false, CFG_OK, "one");
-  EXPECT_READ(dir / "hand.xml", "N", false, CFG_OK, "");
-  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(dir / "hand.xml", "K", "three"));
-  text = VLReadFile(dir / "hand.xml");
-  EXPECT_NE(std::string::npos, text.find("orphan"));
-  EXPECT_NE(std::string::npos, text.find("two"));
-  EXPECT_READ(dir / "hand.xml", "K", false, CFG_OK, "three");
-
-  // Writing counts an empty file as one without settings.
-  ASSERT_EQ(CfgXMLFile::CFG_OK, WriteSetting(dir / "empty.xml", "A", "2"));
-  EXPECT_READ(dir / "empty.xml", "A", false, CFG_OK, "2");
-  EXPECT_EQ(CfgXMLFile::CFG_FILE_ERROR, WriteSetting(dir / "no/such/folder.xml", "A", "3"));
-  EXPECT_EQ(CfgXMLFile::CFG_FILE_ERROR, WriteSetting(dir.path(), "A", "4"));
-}
 
 // A file that does not parse may hold the account's token: it reads as unreadable, not as
 // missing a key, and a write keeps its bytes as NAME.damaged before the new file replaces it.

@@ -26,7 +26,7 @@
 //                              the first js command) and prints its value as JSON (or undefined)
 //   setenv NAME [VALUE]        sets or unsets an environment variable
 //   write-file PATH TEXT       writes a file; truncate PATH N cuts one to N bytes
-//   same PATH PATH             whether two files hold the same bytes
+//   same PATH PATH             whether two files hold the same bytes; show PATH prints one
 //   files FOLDER               the names in the folder, one a line
 //   sql STATEMENT              the rows the statement gives on the file cache in {dir}cache
 // Words are separated by spaces; '...' makes one word of what it quotes. In commands, {token} is
@@ -225,6 +225,10 @@ class Session : public VLTestAccountClient, public testing::WithParamInterface<s
       return VLWriteFile(rest[0], VLReadFile(rest[0]).substr(0, std::stoul(rest[1]))) ? "" : "not written\n";
     }
     if (name == "same" && rest.size() == 2) return VLReadFile(rest[0]) == VLReadFile(rest[1]) ? "same\n" : "different\n";
+    if (name == "show" && rest.size() == 1) {
+      std::string text = VLReadFile(rest[0]);
+      return text.empty() || text.back() == '\n' ? text : text + "\n";
+    }
     if (name == "flag" || name == "cached" || name == "cache-write") {
       return m_Handle.client && m_Handle.client->m_Cache ? CacheCommand(name, rest) : "no cache\n";
     }
